@@ -1,0 +1,7 @@
+#ifndef __TIZEN_H__
+#define __TIZEN_H__
+
+#include <tizen_error.h>
+#include <tizen_type.h>
+
+#endif

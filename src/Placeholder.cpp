@@ -1,0 +1,1 @@
+// Removed once the framework's first source file lands.

@@ -1,0 +1,96 @@
+#include "TestEnv.h"
+
+#include <Ecore.h>
+#include <Ecore_Evas.h>
+
+#include <cstdio>
+#include <fstream>
+#include <sstream>
+#include <sys/stat.h>
+#include <sys/wait.h>
+#include <vector>
+
+namespace memo_test
+{
+std::string &tempRootStorage()
+{
+	static std::string root;
+	return root;
+}
+
+const std::string &tempRoot() { return tempRootStorage(); }
+
+std::string makeTempDir(const std::string &name)
+{
+	static int counter = 0;
+	std::string dir = tempRoot() + "/" + name + "-" + std::to_string(++counter);
+	mkdir(dir.c_str(), 0700);
+	return dir;
+}
+
+bool pump(double timeoutSec, const std::function<bool()> &pred)
+{
+	double end = ecore_time_get() + timeoutSec;
+	while (!pred()) {
+		if (ecore_time_get() > end)
+			return pred();
+		ecore_main_loop_iterate();
+		usleep(1000);
+	}
+	return true;
+}
+
+void pumpFor(double seconds)
+{
+	pump(seconds, [] { return false; });
+}
+
+std::string helperPath(const std::string &name) { return std::string(TEST_HELPER_DIR) + "/" + name; }
+
+bool saveScreenshot(Evas_Object *win, const std::string &pngPath)
+{
+	Evas *evas = evas_object_evas_get(win);
+	Ecore_Evas *ee = ecore_evas_ecore_evas_get(evas);
+	if (!ee)
+		return false;
+	ecore_evas_manual_render(ee);
+	int w = 0, h = 0;
+	ecore_evas_geometry_get(ee, nullptr, nullptr, &w, &h);
+	const void *pixels = ecore_evas_buffer_pixels_get(ee);
+	if (!pixels || w <= 0 || h <= 0)
+		return false;
+	// Copy into an image object so that Evas' own PNG saver writes it.
+	Evas_Object *img = evas_object_image_add(evas);
+	evas_object_image_colorspace_set(img, EVAS_COLORSPACE_ARGB8888);
+	evas_object_image_alpha_set(img, EINA_FALSE);
+	evas_object_image_size_set(img, w, h);
+	evas_object_image_data_copy_set(img, const_cast<void *>(pixels));
+	Eina_Bool ok = evas_object_image_save(img, pngPath.c_str(), nullptr, "compress=6");
+	evas_object_del(img);
+	return ok;
+}
+
+int runCommand(const std::string &cmd, std::string *out)
+{
+	FILE *p = popen(cmd.c_str(), "r");
+	if (!p)
+		return -1;
+	char buf[4096];
+	size_t n;
+	std::string text;
+	while ((n = fread(buf, 1, sizeof(buf), p)) > 0)
+		text.append(buf, n);
+	int status = pclose(p);
+	if (out)
+		*out = text;
+	return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+}
+
+std::string readFile(const std::string &path)
+{
+	std::ifstream in(path, std::ios::binary);
+	std::stringstream ss;
+	ss << in.rdbuf();
+	return ss.str();
+}
+} // namespace memo_test
