@@ -35,6 +35,9 @@ int main(int argc, char **argv)
 	setDir("XDG_RUNTIME_DIR", r + "/xdg-runtime");
 	setDir("TIZEN_APP_ROOT", r + "/app");
 	setDir("TIZEN_VCONF_DIR", r + "/vconf");
+	// The app id and resources of the memo app; spawned helpers get their own id from the registry.
+	setenv("TIZEN_APP_ID", "com.veltron.memo", 1);
+	setenv("TIZEN_APP_RES_DIR", MEMO_APP_ROOT "/res/", 1);
 	setenv("ELM_ENGINE", "buffer", 1);
 	setenv("ELM_DISPLAY", "buffer", 1);
 	setenv("ECORE_EVAS_ENGINE", "buffer", 1);
