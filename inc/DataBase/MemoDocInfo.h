@@ -1,0 +1,128 @@
+#ifndef INC_DATABASE_MEMODOCINFO_H
+#define INC_DATABASE_MEMODOCINFO_H
+
+#include <string>
+
+#include "DataBase/MemoFileInfo.h"
+
+// A memo holds at most ten images and one voice recording.
+#define MEMO_MAX_FILE_COUNT 11
+
+// The default card colour, "red;green;blue;alpha;".
+#define MEMO_DEFAULT_BG_COLOR "228;235;235;255;"
+
+// One memo (a row of the `memo` table) in memory, with its attachments inline.
+// Plain carrier between MemoDbMgr and the views; it never touches the database.
+// Setters return true on success; a refused value logs an error line and keeps the
+// old value (setPhoneNum refuses null silently). String getters return character data
+// valid while the record lives.
+class MemoDocInfo
+{
+public:
+	MemoDocInfo();
+	virtual ~MemoDocInfo();
+
+	// Stores the UUID; returns false in every case (no caller reads it).
+	bool setMemoUUID(const char *uuid);
+	bool setIsDirty(int isDirty);	  // refuses anything but 0 and 1
+	bool setIsDeleted(int isDeleted); // refuses anything but 0 and 1
+	bool setAccountType(const char *accountType);
+	bool setAccountName(const char *accountName);
+	bool setSync1(unsigned long long sync1);
+	bool setSync2(const char *sync2);
+	bool setIsNeedUpsync(int isNeedUpsync); // refuses anything but 0 and 1
+	bool setCreatedAt(unsigned long long createdAt);
+	bool setLastModifiedAt(unsigned long long lastModifiedAt);
+	bool setCategoryUUID(const char *categoryUUID);
+	bool setTitle(const char *title);
+	bool setContent(const char *content);
+	bool setTizenXmlContent(const char *tizenXmlContent);
+	bool setAndroidXmlContent(const char *androidXmlContent);
+	bool setDisplayContent(const char *displayContent);
+	bool setVrfileUUID(const char *vrfileUUID);
+	bool setStrippedContent(const char *strippedContent);
+	bool setData(const char *data);
+	bool setPhoneNum(const char *phoneNum);
+	bool setIsFavorite(int isFavorite);
+	bool setIsHidden(int isHidden);
+	bool setIsQuick(int isQuick);
+	bool setFileCount(int fileCount); // refuses a negative count
+
+	// Stores the colour text and parses it into the four ints. A text that is not
+	// 16 characters long and does not hold exactly four ";" is replaced by the default
+	// first. Returns false, keeping the ints parsed so far, when a ";" is missing.
+	// A field that is no number throws std::invalid_argument from std::stoi.
+	bool setBgColor(const char *bgColor);
+	// Stores the four ints and rebuilds the colour text from them.
+	bool setBgColorRgba(int red, int green, int blue, int alpha);
+	// Copies the first getFileCount() entries of source into the record's files
+	// (call setFileCount first); each entry's data is re-derived from its path.
+	void copyFileInfos(const MemoFileInfo *source);
+
+	// Returns the UUID; a record that has none gets a new one here (so asking writes).
+	const char *getMemoUUID();
+	int getIsDirty() const { return __isDirty; }
+	int getIsDeleted() const { return __isDeleted; }
+	const char *getAccountType() const { return __accountType.c_str(); }
+	const char *getAccountName() const { return __accountName.c_str(); }
+	unsigned long long getSync1() const { return __sync1; }
+	const char *getSync2() const { return __sync2.c_str(); }
+	int getIsNeedUpsync() const { return __isNeedUpsync; }
+	unsigned long long getCreatedAt() const { return __createdAt; }
+	unsigned long long getLastModifiedAt() const { return __lastModifiedAt; }
+	const char *getCategoryUUID() const { return __categoryUUID.c_str(); }
+	const char *getTitle() const { return __title.c_str(); }
+	const char *getContent() const { return __content.c_str(); }
+	const char *getAndroidXmlContent() const { return __androidXmlContent.c_str(); }
+	const char *getTizenXmlContent() const { return __tizenXmlContent.c_str(); }
+	const char *getDisplayContent() const { return __displayContent.c_str(); }
+	const char *getVrfileUUID() const { return __vrfileUUID.c_str(); }
+	const char *getStrippedContent() const { return __strippedContent.c_str(); }
+	const char *getData() const { return __data.c_str(); }
+	const char *getPhoneNum() const { return __phoneNum.c_str(); }
+	int getIsFavorite() const { return __isFavorite; }
+	int getIsHidden() const { return __isHidden; }
+	int getIsQuick() const { return __isQuick; }
+	int getFileCount() const { return __fileCount; }
+	// The inline array of MEMO_MAX_FILE_COUNT entries; the used ones are the first getFileCount().
+	MemoFileInfo *getFiles() { return __files; }
+	const MemoFileInfo *getFiles() const { return __files; }
+	const char *getBgColor() const { return __bgColor.c_str(); }
+	// Writes the four colour ints through the out arguments (null ones are skipped).
+	void getBgColorRgba(int *red, int *green, int *blue, int *alpha) const;
+
+private:
+	std::string __memoUUID;
+	int __isDirty;
+	int __isDeleted;
+	std::string __accountType;
+	std::string __accountName;
+	unsigned long long __sync1;
+	std::string __sync2;
+	int __isNeedUpsync;
+	unsigned long long __createdAt;
+	unsigned long long __lastModifiedAt;
+	std::string __categoryUUID;
+	std::string __title;
+	std::string __content;
+	std::string __androidXmlContent;
+	std::string __tizenXmlContent;
+	std::string __displayContent;
+	std::string __vrfileUUID;
+	std::string __strippedContent;
+	std::string __data;
+	std::string __phoneNum;
+	int __isFavorite;
+	int __isHidden;
+	int __isQuick;
+	int __fileCount;
+	MemoFileInfo __files[MEMO_MAX_FILE_COUNT];
+	int __bgRed;
+	int __bgGreen;
+	int __bgBlue;
+	int __bgAlpha;
+	std::string __bgColor;
+	int __changed;
+};
+
+#endif

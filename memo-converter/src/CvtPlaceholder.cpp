@@ -1,1 +1,0 @@
-// Removed once the framework's first source file lands.

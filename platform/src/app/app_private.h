@@ -1,0 +1,153 @@
+/* Shared internals of the application layer: registry, launch channel, lifecycle hooks. */
+#ifndef PLATFORM_SRC_APP_APP_PRIVATE_H
+#define PLATFORM_SRC_APP_APP_PRIVATE_H
+
+#include <app_control.h>
+#include <bundle.h>
+#include <stdbool.h>
+#include <sys/types.h>
+
+#include <Ecore.h>
+#include <Ecore_Ipc.h>
+#include <Evas.h>
+
+#ifdef __cplusplus
+extern "C" {
+#endif
+
+/* ---- paths (app_paths.c) ---- */
+
+/* The app id of this process (malloc'ed) or NULL; never logs. */
+char *app_paths_app_id_get(void);
+/* Creates every missing folder of path (mode 0700); true when it exists afterwards. Never logs. */
+bool app_paths_mkdir_p(const char *path);
+/* Folder of per-user run-time files (pid files, logs of started apps), created; malloc'ed, no trailing "/". */
+char *app_paths_runtime_dir_get(void);
+/* Label and icon of the manifest beside the executable, malloc'ed, or NULL. */
+char *app_paths_manifest_value_get(const char *what);
+
+/* ---- registry (app_registry.c) ---- */
+
+/* Set in a spawned app's environment: its first request comes over the launch socket, not argv. */
+#define APP_LAUNCH_WAIT_ENV "TIZEN_APP_LAUNCH_WAIT"
+
+/* One "<id>.ini" entry of the launch registry. */
+typedef struct {
+	char *id;
+	char *exec;
+	char *root;
+	char *label;
+	char *icon;
+	char *operations; /* comma-separated, may be NULL */
+} app_registry_entry_s;
+
+/* Looks the id up in TIZEN_APPS_DIR (colon-separated) and then the built-in folder; NULL if absent. */
+app_registry_entry_s *app_registry_find(const char *app_id);
+/* Calls cb for every entry (first folder wins for a duplicate id); cb returns false to stop. */
+void app_registry_foreach(bool (*cb)(const app_registry_entry_s *entry, void *data), void *data);
+/* True when the entry handles the operation (an entry without operations takes none). */
+bool app_registry_entry_handles(const app_registry_entry_s *entry, const char *operation);
+void app_registry_entry_free(app_registry_entry_s *entry);
+/* Starts the entry's program with TIZEN_APP_ID=<id> and the "wait for the request" mark; pid or -1 (logged). */
+pid_t app_registry_spawn(const app_registry_entry_s *entry);
+
+/* ---- handle internals (app_control.c) ---- */
+
+struct app_control_s {
+	char *operation;
+	char *uri;
+	char *mime;
+	char *category;
+	char *app_id;
+	app_control_launch_mode_e launch_mode;
+	bundle *data; /* extra data only */
+	/* Set on requests received from another process. */
+	char *caller;
+	bool reply_requested;
+	unsigned int reply_token; /* 0: not a received request */
+};
+
+/* Serialises every field and the extra data into one bundle text (malloc'ed, caller frees). */
+bool app_control_encode_internal(app_control_h app_control, const char *caller, bool reply_requested,
+				 bundle_raw **raw, int *len);
+/* Rebuilds a handle (with caller and reply flag) from app_control_encode_internal's text; NULL if malformed. */
+app_control_h app_control_decode_internal(const bundle_raw *raw, int len);
+/* True for keys the platform keeps for itself. */
+bool app_control_key_is_reserved(const char *key);
+
+/* ---- launch channel (app_channel.c) ---- */
+
+/* Message kinds on an app's launch socket. */
+enum {
+	APP_CHANNEL_MSG_LAUNCH = 1, /* ref: request number, response: 1 if a reply is wanted, data: request */
+	APP_CHANNEL_MSG_REPLY = 2,  /* ref_to: request number, response: result, data: reply */
+	APP_CHANNEL_MSG_TERMINATE = 3,
+	APP_CHANNEL_MSG_RESUME = 4,
+};
+
+/* Socket name of an app's launch channel (malloc'ed). */
+char *app_channel_name_get(const char *app_id);
+/* A connection to the running app, or NULL when it is not running. */
+Ecore_Ipc_Server *app_channel_connect(const char *app_id);
+/* True when an app with this id answers on its launch socket. */
+bool app_channel_is_running(const char *app_id);
+/* Asks a running app to bring its windows to the front; APP_CONTROL_ERROR_* (APP_NOT_FOUND if not running). */
+int app_channel_send_resume(const char *app_id);
+/* Sends a request to an already running app_id, never starting it; APP_CONTROL_ERROR_*. */
+int app_launch_forward(app_control_h request, const char *app_id);
+
+/* ---- the running app's side (app_server.c) ---- */
+
+/* Opens this app's launch socket; false when another instance owns it. */
+bool app_server_start(const char *app_id);
+void app_server_stop(void);
+/* Sends the reply of a received request; APP_CONTROL_ERROR_* */
+int app_server_reply(unsigned int reply_token, app_control_h reply, app_control_result_e result);
+/* Pid of the running instance of app_id (from its pid file), or -1. */
+pid_t app_server_pid_get(const char *app_id);
+
+/* ---- lifecycle hooks (app_main.c) ---- */
+
+/* Delivers a request to the app's app_control callback (raising its windows when not the first). */
+void app_main_deliver_request(app_control_h request);
+/* Brings the app's windows to the front. */
+void app_main_raise(void);
+/* True while ui_app_main runs. */
+bool app_main_is_running(void);
+
+/* ---- events (app_event.c) ---- */
+
+/* Device rotation in degrees (0, 90, 180, 270); a desktop has no sensor, so this vconf key stands in. */
+#define APP_ROTATION_VCONF_KEY "memory/desktop/rotation"
+
+/* Starts and stops the device-state watches behind the app events (language, rotation, region ...). */
+void app_event_watch_start(void);
+void app_event_watch_stop(void);
+/* Applies the language of the device (vconf) to gettext and the C library's locale. */
+void app_event_language_apply(void);
+/* Applies the stored rotation to the windows (after create, when it is not 0). */
+void app_event_rotation_apply(void);
+
+/* ---- windows (app_window.c) ---- */
+
+/* Every top-level Elementary window of this process. The list is freed by the caller (eina_list_free). */
+Eina_List *app_window_list_get(void);
+/* The first visible window (else the first one), or NULL. */
+Evas_Object *app_window_main_get(void);
+/* De-iconifies, raises and activates every window. */
+void app_window_raise_all(void);
+/* Rotates every window that takes the rotation, and announces it with "wm,rotation,changed". */
+void app_window_rotate_all(int degree);
+
+/* ---- screenshot hook (app_screenshot.c) ---- */
+
+/* With TIZEN_SCREENSHOT=<png> set, saves the main window's canvas a moment after the first request
+   (and ends the app with TIZEN_SCREENSHOT_EXIT=1). */
+void app_screenshot_schedule(void);
+void app_screenshot_cancel(void);
+
+#ifdef __cplusplus
+}
+#endif
+
+#endif /* PLATFORM_SRC_APP_APP_PRIVATE_H */

@@ -1,0 +1,260 @@
+#include "DataBase/MemoDocInfo.h"
+
+#include <cstdlib>
+#include <cstring>
+
+#include "MemoLog.h"
+#include "Util/MemoUtil.h"
+
+MemoDocInfo::MemoDocInfo()
+	: __isDirty(1), __isDeleted(0), __sync1(0), __isNeedUpsync(1), __createdAt(1), __lastModifiedAt(1),
+	  __isFavorite(0), __isHidden(0), __isQuick(0), __fileCount(0), __bgRed(228), __bgGreen(235), __bgBlue(235),
+	  __bgAlpha(255), __bgColor(MEMO_DEFAULT_BG_COLOR), __changed(0)
+{
+	(void)__changed;
+}
+
+MemoDocInfo::~MemoDocInfo() {}
+
+// A flag column holds 0 or 1; a negative value fails the test too, as unsigned.
+static bool __isFlag(int value) { return static_cast<unsigned int>(value) <= 1; }
+
+// Stores a string field, refusing null with the given line.
+#define MEMO_SET_STRING(field, value, message)                                                                        \
+	do {                                                                                                               \
+		if (!(value)) {                                                                                                \
+			MEMO_LOGE(message);                                                                                        \
+			return false;                                                                                              \
+		}                                                                                                              \
+		field = (value);                                                                                               \
+		return true;                                                                                                   \
+	} while (0)
+
+bool MemoDocInfo::setMemoUUID(const char *uuid)
+{
+	if (!uuid) {
+		MEMO_LOGE("uuid is NULL");
+		return false;
+	}
+	__memoUUID = uuid;
+	return false;
+}
+
+bool MemoDocInfo::setIsDirty(int isDirty)
+{
+	if (!__isFlag(isDirty)) {
+		MEMO_LOGE("isDirty is Wrong Value");
+		return false;
+	}
+	__isDirty = isDirty;
+	return true;
+}
+
+bool MemoDocInfo::setIsDeleted(int isDeleted)
+{
+	if (!__isFlag(isDeleted)) {
+		MEMO_LOGE("isDeleted is Wrong Value");
+		return false;
+	}
+	__isDeleted = isDeleted;
+	return true;
+}
+
+bool MemoDocInfo::setAccountType(const char *accountType)
+{
+	MEMO_SET_STRING(__accountType, accountType, "accountType is NULL");
+}
+
+bool MemoDocInfo::setAccountName(const char *accountName)
+{
+	MEMO_SET_STRING(__accountName, accountName, "accountName is NULL");
+}
+
+bool MemoDocInfo::setSync1(unsigned long long sync1)
+{
+	__sync1 = sync1;
+	return true;
+}
+
+bool MemoDocInfo::setSync2(const char *sync2) { MEMO_SET_STRING(__sync2, sync2, "sync2 is NULL"); }
+
+bool MemoDocInfo::setIsNeedUpsync(int isNeedUpsync)
+{
+	if (!__isFlag(isNeedUpsync)) {
+		MEMO_LOGE("isNeedUpsync is Wrong Value");
+		return false;
+	}
+	__isNeedUpsync = isNeedUpsync;
+	return true;
+}
+
+bool MemoDocInfo::setCreatedAt(unsigned long long createdAt)
+{
+	__createdAt = createdAt;
+	return true;
+}
+
+bool MemoDocInfo::setLastModifiedAt(unsigned long long lastModifiedAt)
+{
+	__lastModifiedAt = lastModifiedAt;
+	return true;
+}
+
+bool MemoDocInfo::setCategoryUUID(const char *categoryUUID)
+{
+	MEMO_SET_STRING(__categoryUUID, categoryUUID, "categoryUUID is NULL");
+}
+
+bool MemoDocInfo::setTitle(const char *title) { MEMO_SET_STRING(__title, title, "title is NULL"); }
+
+bool MemoDocInfo::setContent(const char *content) { MEMO_SET_STRING(__content, content, "content is NULL"); }
+
+bool MemoDocInfo::setTizenXmlContent(const char *tizenXmlContent)
+{
+	MEMO_SET_STRING(__tizenXmlContent, tizenXmlContent, "tizenXmlContent is NULL");
+}
+
+bool MemoDocInfo::setAndroidXmlContent(const char *androidXmlContent)
+{
+	MEMO_SET_STRING(__androidXmlContent, androidXmlContent, "androidXmlContent is NULL");
+}
+
+bool MemoDocInfo::setDisplayContent(const char *displayContent)
+{
+	MEMO_SET_STRING(__displayContent, displayContent, "display_Content is NULL");
+}
+
+bool MemoDocInfo::setVrfileUUID(const char *vrfileUUID)
+{
+	MEMO_SET_STRING(__vrfileUUID, vrfileUUID, "vrfileUUID is NULL");
+}
+
+bool MemoDocInfo::setStrippedContent(const char *strippedContent)
+{
+	MEMO_SET_STRING(__strippedContent, strippedContent, "strippedContent is NULL");
+}
+
+bool MemoDocInfo::setData(const char *data) { MEMO_SET_STRING(__data, data, "data is NULL"); }
+
+bool MemoDocInfo::setPhoneNum(const char *phoneNum)
+{
+	// _phoneNum is NULL on most rows: no line for it.
+	if (!phoneNum)
+		return false;
+	__phoneNum = phoneNum;
+	return true;
+}
+
+bool MemoDocInfo::setIsFavorite(int isFavorite)
+{
+	__isFavorite = isFavorite;
+	return true;
+}
+
+bool MemoDocInfo::setIsHidden(int isHidden)
+{
+	__isHidden = isHidden;
+	return true;
+}
+
+bool MemoDocInfo::setIsQuick(int isQuick)
+{
+	__isQuick = isQuick;
+	return true;
+}
+
+bool MemoDocInfo::setFileCount(int fileCount)
+{
+	if (fileCount < 0) {
+		MEMO_LOGE("fileCount is Wrong Value");
+		return false;
+	}
+	__fileCount = fileCount;
+	return true;
+}
+
+bool MemoDocInfo::setBgColor(const char *bgColor)
+{
+	__bgColor = bgColor ? bgColor : "";
+	// A 16-character text ("rrr;ggg;bbb;aaa;") is trusted as it stands; anything else
+	// must at least have its four separators.
+	if (__bgColor.length() != 16) {
+		size_t separators = 0;
+		for (char c : __bgColor)
+			if (c == ';')
+				++separators;
+		if (__bgColor.empty() || separators != 4)
+			__bgColor = MEMO_DEFAULT_BG_COLOR;
+	}
+
+	int *channels[] = {&__bgRed, &__bgGreen, &__bgBlue, &__bgAlpha};
+	size_t start = 0;
+	for (int *channel : channels) {
+		size_t end = __bgColor.find(';', start);
+		if (end == std::string::npos)
+			return false;
+		*channel = std::stoi(__bgColor.substr(start, end - start));
+		start = end + 1;
+	}
+	return true;
+}
+
+bool MemoDocInfo::setBgColorRgba(int red, int green, int blue, int alpha)
+{
+	__bgRed = red;
+	__bgGreen = green;
+	__bgBlue = blue;
+	__bgAlpha = alpha;
+	__bgColor = std::to_string(red) + ";" + std::to_string(green) + ";" + std::to_string(blue) + ";" +
+				std::to_string(alpha) + ";";
+	return true;
+}
+
+void MemoDocInfo::copyFileInfos(const MemoFileInfo *source)
+{
+	if (!source)
+		return;
+	for (int i = 0; i < __fileCount && i < MEMO_MAX_FILE_COUNT; ++i) {
+		const MemoFileInfo &from = source[i];
+		MemoFileInfo &to = __files[i];
+		to.setFileUUID(from.getFileUUID());
+		to.setIsDirty(from.getIsDirty());
+		to.setIsDeleted(from.getIsDeleted());
+		to.setAccountType(from.getAccountType());
+		to.setAccountName(from.getAccountName());
+		to.setSync1(from.getSync1());
+		to.setSync2(from.getSync2());
+		to.setIsNeedUpsync(from.getIsNeedUpsync());
+		to.setMemoUUID(from.getMemoUUID());
+		to.setMimeType(from.getMimeType());
+		to.setDisplayName(from.getDisplayName());
+		to.setSize(from.getSize());
+		to.setOrientation(from.getOrientation());
+		to.setData(from.getData());
+		to.setPath(from.getPath());
+	}
+}
+
+const char *MemoDocInfo::getMemoUUID()
+{
+	if (__memoUUID.empty()) {
+		char *uuid = nullptr;
+		if (MemoUtil::createUUIDN(&uuid)) {
+			setMemoUUID(uuid);
+			free(uuid);
+		}
+	}
+	return __memoUUID.c_str();
+}
+
+void MemoDocInfo::getBgColorRgba(int *red, int *green, int *blue, int *alpha) const
+{
+	if (red)
+		*red = __bgRed;
+	if (green)
+		*green = __bgGreen;
+	if (blue)
+		*blue = __bgBlue;
+	if (alpha)
+		*alpha = __bgAlpha;
+}

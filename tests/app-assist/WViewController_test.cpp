@@ -1,0 +1,236 @@
+// Controllers living and dying with their objects: views, popups, menus, timers, gengrid items.
+#include <string>
+#include <vector>
+
+#include "TestEnv.h"
+#include "WGengridItem.h"
+#include "WMenuPopupController.h"
+#include "WPopupController.h"
+#include "WUiTimer.h"
+#include "support/AppAssistFixture.h"
+
+using aa_test::LoggingPage;
+using app_assist::WGengridItem;
+using app_assist::WMenuPopupController;
+using app_assist::WPopupController;
+using app_assist::WUiTimer;
+using app_assist::WViewControllerWeakPtr;
+using Log = std::vector<std::string>;
+
+namespace
+{
+
+class ViewControllerTest : public aa_test::UiTest
+{
+protected:
+	LoggingPage *pushPage(const char *tag)
+	{
+		LoggingPage *page = new LoggingPage(tag, &log);
+		EXPECT_TRUE(naviframe->push(page));
+		return page;
+	}
+	// A popup with the given buttons, attached to page.
+	WPopupController *attachPopup(LoggingPage *page, std::function<void(bool *)> first,
+								  std::function<void(bool *)> second = nullptr)
+	{
+		WPopupController *popup = new WPopupController();
+		popup->setTextTranslatable("app-assist-test");
+		popup->setTitle("IDS_TITLE");
+		popup->setContent("IDS_TEXT");
+		popup->addButton("IDS_CANCEL", first);
+		popup->addButton("IDS_OK", second);
+		EXPECT_TRUE(page->attachPopup(popup));
+		return popup;
+	}
+	static Evas_Object *button(WPopupController *popup, const char *part)
+	{
+		return elm_object_part_content_get(popup->getEvasObj(), part);
+	}
+	Log log;
+};
+
+TEST_F(ViewControllerTest, ControllerDiesWithItsObjectAndItsWeakPointerEmpties)
+{
+	LoggingPage *page = pushPage("A");
+	WViewControllerWeakPtr weak = page->getWeakPtr();
+	ASSERT_EQ(weak.lock().get(), page);
+	evas_object_del(page->getEvasObj());
+	EXPECT_TRUE(weak.expired());
+	EXPECT_EQ(weak.lock(), nullptr);
+	EXPECT_EQ(log.back(), "A:destructor");
+}
+
+TEST_F(ViewControllerTest, DestroyWithoutObjectDeletesTheController)
+{
+	LoggingPage *page = new LoggingPage("A", &log);
+	WViewControllerWeakPtr weak = page->getWeakPtr();
+	page->destroy();
+	EXPECT_TRUE(weak.expired());
+	EXPECT_EQ(log, (Log{"A:constructor", "A:destructor"}));
+}
+
+TEST_F(ViewControllerTest, PopupButtonClosesOnlyWhenItsFlagIsSet)
+{
+	LoggingPage *page = pushPage("A");
+	int cancelCalls = 0, okCalls = 0;
+	WPopupController *popup =
+		attachPopup(page, [&](bool *) { ++cancelCalls; }, [&](bool *close) {
+			++okCalls;
+			*close = true;
+		});
+	WViewControllerWeakPtr weak = popup->getWeakPtr();
+	ASSERT_NE(popup->getEvasObj(), nullptr);
+	EXPECT_EQ(page->getPopup(), popup);
+
+	evas_object_smart_callback_call(button(popup, "button1"), "clicked", nullptr);
+	EXPECT_EQ(cancelCalls, 1);
+	EXPECT_FALSE(weak.expired());
+
+	evas_object_smart_callback_call(button(popup, "button2"), "clicked", nullptr);
+	EXPECT_EQ(okCalls, 1);
+	EXPECT_TRUE(weak.expired());
+	EXPECT_EQ(page->getPopup(), nullptr);
+}
+
+TEST_F(ViewControllerTest, EmptyButtonFunctionLeavesThePopupOpen)
+{
+	LoggingPage *page = pushPage("A");
+	WPopupController *popup = attachPopup(page, nullptr);
+	WViewControllerWeakPtr weak = popup->getWeakPtr();
+	evas_object_smart_callback_call(button(popup, "button1"), "clicked", nullptr);
+	EXPECT_FALSE(weak.expired());
+}
+
+TEST_F(ViewControllerTest, PopupDiesWithItsViewAndIsReplacedByTheNext)
+{
+	LoggingPage *page = pushPage("A");
+	WViewControllerWeakPtr first = attachPopup(page, nullptr)->getWeakPtr();
+	WViewControllerWeakPtr second = attachPopup(page, nullptr)->getWeakPtr();
+	EXPECT_TRUE(first.expired());
+	ASSERT_FALSE(second.expired());
+	page->destroy();
+	EXPECT_TRUE(second.expired());
+}
+
+TEST_F(ViewControllerTest, BackKeyClosesThePopupBeforeThePage)
+{
+	LoggingPage *a = pushPage("A");
+	LoggingPage *b = pushPage("B");
+	WViewControllerWeakPtr popup = attachPopup(b, nullptr)->getWeakPtr();
+	runFor(0.1);
+	pressKey("Escape");
+	EXPECT_TRUE(popup.expired());
+	EXPECT_EQ(naviframe->getTopContentViewController(), b);
+	pressKey("Escape");
+	ASSERT_TRUE(waitFor([&] { return naviframe->getTopContentViewController() == a; }));
+}
+
+TEST_F(ViewControllerTest, MenuRunsTheSelectedItemAndCloses)
+{
+	LoggingPage *page = pushPage("A");
+	WMenuPopupController *menu = new WMenuPopupController();
+	ASSERT_TRUE(menu->createMenu(window->getEvasObj(), naviframe->getEvasObj()));
+	Log picked;
+	ASSERT_TRUE(menu->appendItem("first", [&] { picked.push_back("first"); }));
+	ASSERT_TRUE(menu->appendItem("second", [&] { picked.push_back("second"); }));
+	ASSERT_TRUE(menu->showMenu());
+	ASSERT_TRUE(page->attachPopup(menu));
+	WViewControllerWeakPtr weak = menu->getWeakPtr();
+
+	const Eina_List *items = elm_ctxpopup_items_get(menu->getEvasObj());
+	ASSERT_EQ(eina_list_count(items), 2u);
+	EXPECT_STREQ(elm_object_item_text_get(static_cast<Elm_Object_Item *>(eina_list_data_get(items))), "first");
+	Elm_Object_Item *second = static_cast<Elm_Object_Item *>(eina_list_nth(items, 1));
+	elm_ctxpopup_item_selected_set(second, EINA_TRUE);
+	ASSERT_TRUE(waitFor([&] { return weak.expired(); }));
+	EXPECT_EQ(picked, (Log{"second"}));
+}
+
+TEST_F(ViewControllerTest, MenuItemMayReplaceTheMenuByAPopup)
+{
+	LoggingPage *page = pushPage("A");
+	WMenuPopupController *menu = new WMenuPopupController();
+	ASSERT_TRUE(menu->createMenu(window->getEvasObj(), naviframe->getEvasObj()));
+	menu->appendItem("delete", [&] { attachPopup(page, nullptr); });
+	menu->showMenu();
+	page->attachPopup(menu);
+	WViewControllerWeakPtr weak = menu->getWeakPtr();
+	Elm_Object_Item *item =
+		static_cast<Elm_Object_Item *>(eina_list_data_get(elm_ctxpopup_items_get(menu->getEvasObj())));
+	elm_ctxpopup_item_selected_set(item, EINA_TRUE);
+	EXPECT_TRUE(weak.expired());
+	ASSERT_NE(page->getPopup(), nullptr);
+	EXPECT_STREQ(page->getPopup()->getClassName(), "WPopupController");
+}
+
+TEST_F(ViewControllerTest, TimerRepeatsUntilFalseAndDiesWithItsOwner)
+{
+	int ticks = 0;
+	WUiTimer::addTimer(0.01, [&](void *data) { return ++*static_cast<int *>(data) < 3; }, &ticks);
+	ASSERT_TRUE(waitFor([&] { return ticks == 3; }));
+	runFor(0.1);
+	EXPECT_EQ(ticks, 3);
+
+	LoggingPage *page = pushPage("A");
+	int ownedTicks = 0;
+	auto handle = WUiTimer::addTimer(0.01, [&](void *) { return ++ownedTicks > 0; }, nullptr, page->getEvasObj());
+	ASSERT_TRUE(waitFor([&] { return ownedTicks >= 1; }));
+	page->destroy();
+	EXPECT_TRUE(handle.expired());
+	int after = ownedTicks;
+	runFor(0.1);
+	EXPECT_EQ(ownedTicks, after);
+}
+
+TEST_F(ViewControllerTest, IdlerThatDeletesItsOwnerEndsCleanly)
+{
+	LoggingPage *page = pushPage("A");
+	int runs = 0;
+	WUiTimer::addIdler(
+		[&](void *) {
+			++runs;
+			page->destroy();
+			return true;
+		},
+		nullptr, page->getEvasObj());
+	ASSERT_TRUE(waitFor([&] { return runs == 1; }));
+	runFor(0.1);
+	EXPECT_EQ(runs, 1);
+}
+
+TEST_F(ViewControllerTest, DeletedTimerNeverRuns)
+{
+	int runs = 0;
+	auto handle = WUiTimer::addTimer(0.0, [&](void *) { return ++runs > 0; }, nullptr);
+	WUiTimer::deleteTimer(handle);
+	EXPECT_TRUE(handle.expired());
+	runFor(0.05);
+	EXPECT_EQ(runs, 0);
+	WUiTimer::deleteTimer(handle); // ended already: nothing happens
+}
+
+struct CountingItem : WGengridItem {
+	explicit CountingItem(int *alive) : __alive(alive) { ++*__alive; }
+	~CountingItem() override { --*__alive; }
+	int *__alive;
+};
+
+TEST_F(ViewControllerTest, GengridItemsDieWithTheirGengridItems)
+{
+	Evas_Object *grid = elm_gengrid_add(window->getEvasObj());
+	int alive = 0;
+	for (int i = 0; i < 3; ++i) {
+		CountingItem *item = new CountingItem(&alive);
+		Elm_Gengrid_Item_Class *itemClass = item->getItemClassNew();
+		item->setElmObjectItem(elm_gengrid_item_append(grid, itemClass, item, nullptr, nullptr));
+		elm_gengrid_item_class_free(itemClass);
+		EXPECT_NE(item->getElmObjectItem(), nullptr);
+	}
+	EXPECT_EQ(alive, 3);
+	elm_object_item_del(elm_gengrid_first_item_get(grid));
+	EXPECT_EQ(alive, 2);
+	evas_object_del(grid);
+	EXPECT_EQ(alive, 0);
+}
+
+} // namespace

@@ -1,0 +1,101 @@
+// The saved markup of an item and the share texts made from display text.
+#include "Box/MemoContentMarkup.h"
+#include "Box/MemoShareText.h"
+#include "Box/MemoTodoListDocument.h"
+
+#include <Elementary.h>
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <string>
+
+namespace
+{
+std::string saved(const char *markup)
+{
+	char *out = memoSavedMarkupN(markup);
+	std::string result = out ? out : "(null)";
+	free(out);
+	return result;
+}
+
+class ShareText : public ::testing::Test
+{
+protected:
+	// The markup conversion needs Evas only; a full Elementary start is not needed.
+	static void SetUpTestSuite() { evas_init(); }
+	static void TearDownTestSuite() { evas_shutdown(); }
+};
+} // namespace
+
+TEST(SavedMarkup, RemovesFormatTagsOnly)
+{
+	EXPECT_EQ("red bold", saved("<color=#ff0000>red</color> bold"));
+	EXPECT_EQ("left", saved("<align=left>left</align>"));
+	// "<u..." goes, its closing tag stays: the pass looks at the first letter only.
+	EXPECT_EQ("x</underline>", saved("<underline=on>x</underline>"));
+	EXPECT_EQ("x</u>", saved("<u>x</u>"));
+	const char *kept = "a &amp; b<br/><item size=240x180 vsize=full href=file:///m/a.jpg></item><br/>"
+	                   "<font_size=20>f</font_size><b>b</b>";
+	EXPECT_EQ(kept, saved(kept));
+}
+
+TEST(SavedMarkup, EndsAndUnclosedTags)
+{
+	// A "<" with fewer than two characters behind it ends the pass.
+	EXPECT_EQ("abc", saved("abc<"));
+	EXPECT_EQ("abc", saved("abc<x"));
+	EXPECT_EQ("abc<xdef", saved("abc<x<color>def"));
+	EXPECT_EQ("abc<br", saved("abc<br"));
+	// An unclosed format tag runs to the end.
+	EXPECT_EQ("abc", saved("abc<color=#fff"));
+	EXPECT_EQ("", saved(""));
+	EXPECT_EQ("", saved(nullptr));
+}
+
+TEST(ShareMarkers, TwoTables)
+{
+	const std::string display = "top\n<CHECK state=false>a</CHECK><CHECK state=true>b</CHECK>end";
+	EXPECT_EQ("top\n[  ]a\n[v]b\nend", memoApplyEditShareMarkers(display));
+	EXPECT_EQ("top\n[ ]a\n[V]b\nend", memoApplyListShareMarkers(display));
+	EXPECT_EQ("<CHECK state=maybe>", memoApplyListShareMarkers("<CHECK state=maybe>"));
+}
+
+TEST_F(ShareText, EditShareFromDocument)
+{
+	std::vector<MemoTodoListItem> items(3);
+	items[0].type = MEMO_BOX_ITEM_FIRST_TEXT;
+	items[0].content = "Fish &amp; chips&lt;3<br/><item size=240x180 vsize=full href=file:///m/a.jpg></item><br/>x";
+	items[1].type = MEMO_BOX_ITEM_CHECK;
+	items[1].checked = true;
+	items[1].content = "milk";
+	items[2].type = MEMO_BOX_ITEM_CHECK;
+	items[2].content = "eggs";
+	char *doc = memoComposeTodoListXmlN(items);
+	const std::string text = memoComposeEditShareText("Title", doc, "ignored");
+	free(doc);
+	EXPECT_EQ("Title\nFish & chips\xEF\xBC\x9C"
+	          "3\n\nx\n[v]milk\n[  ]eggs\n",
+	          text);
+}
+
+TEST_F(ShareText, EditShareFallsBackToDisplayContent)
+{
+	EXPECT_EQ("[  ]ab\n", memoComposeEditShareText("", "",
+	                                               "<CHECK state=false>a\xC2\xA0"
+	                                               "b</CHECK>"));
+	EXPECT_EQ("T\n", memoComposeEditShareText("T", nullptr, nullptr));
+	EXPECT_EQ("", memoComposeEditShareText(nullptr, nullptr, nullptr));
+	const std::string longText(50000, 'a');
+	EXPECT_EQ(40959u, memoComposeEditShareText(nullptr, nullptr, longText.c_str()).size());
+}
+
+TEST(PickText, TitleAndDisplayOnlyWithDocument)
+{
+	EXPECT_EQ("T\n[V]a\n[ ]b\n",
+	          memoComposePickText("T", "<todolist>...", "<CHECK state=true>a</CHECK><CHECK state=false>b</CHECK>"));
+	// A memo without a document contributes only its title.
+	EXPECT_EQ("T\n", memoComposePickText("T", "", "stale"));
+	EXPECT_EQ("body", memoComposePickText("", "<todolist>", "body"));
+	EXPECT_EQ("", memoComposePickText(nullptr, nullptr, nullptr));
+}

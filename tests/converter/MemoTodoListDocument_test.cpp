@@ -1,0 +1,193 @@
+// The todolist document as the editor writes and reads it.
+#include "Box/MemoTodoListDocument.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <string>
+#include <vector>
+
+namespace
+{
+std::string compose(const std::vector<MemoTodoListItem> &items)
+{
+	char *xml = memoComposeTodoListXmlN(items);
+	std::string result = xml;
+	free(xml);
+	return result;
+}
+
+MemoTodoListItem item(_MemoBoxItemType type, bool checked, const std::string &content)
+{
+	MemoTodoListItem i;
+	i.type = type;
+	i.checked = checked;
+	i.content = content;
+	return i;
+}
+
+std::vector<MemoTodoListItem> parse(const std::string &xml, bool *ok = nullptr, size_t existing = 0)
+{
+	std::vector<MemoTodoListItem> items;
+	const bool result = memoParseTodoListXml(xml.c_str(), items, existing);
+	if (ok)
+		*ok = result;
+	return items;
+}
+
+const char IMAGE[] = "<item size=240x180 vsize=full href=file:///data/media/U/a b.jpg></item><br/>";
+} // namespace
+
+TEST(TodoListWriter, LayoutAndEscaping)
+{
+	const std::string xml =
+	    compose({item(MEMO_BOX_ITEM_FIRST_CHECK, true, "a &amp; b<br/>c"), item(MEMO_BOX_ITEM_TEXT, true, "x \"q\""),
+	             item(MEMO_BOX_ITEM_QUICK_TEXT, false, "q")});
+	EXPECT_EQ("<todolist>\n"
+	          "<todolist_item todo_item_type=\"1\" todo_item_state=\"true\" "
+	          "todo_item_content=\"a &amp;amp; b&lt;br/&gt;c\"/>\n"
+	          "<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"x &quot;q&quot;\"/>\n"
+	          "<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"q\"/>\n"
+	          "</todolist>\n",
+	          xml);
+}
+
+TEST(TodoListWriter, NoItemsGivesEmptyString)
+{
+	EXPECT_EQ("", compose({}));
+	// Empty items are skipped, a ticked one included: its tick is lost.
+	EXPECT_EQ("", compose({item(MEMO_BOX_ITEM_FIRST_CHECK, true, ""), item(MEMO_BOX_ITEM_TEXT, false, "")}));
+	MemoTodoListWriter writer;
+	char *xml = writer.finishN();
+	ASSERT_NE(nullptr, xml);
+	EXPECT_STREQ("", xml);
+	free(xml);
+}
+
+TEST(TodoListWriter, LongDocumentIsCutAndReaderKeepsItemsBeforeTheCut)
+{
+	std::vector<MemoTodoListItem> items;
+	for (int i = 0; i < 60; ++i)
+		items.push_back(item(i == 0 ? MEMO_BOX_ITEM_FIRST_TEXT : MEMO_BOX_ITEM_TEXT, false,
+		                     "item " + std::to_string(i) + " " + std::string(1000, 'x')));
+	const std::string xml = compose(items);
+	ASSERT_EQ(40959u, xml.size());
+	EXPECT_EQ(std::string::npos, xml.find("</todolist>"));
+
+	bool ok = false;
+	const std::vector<MemoTodoListItem> back = parse(xml, &ok);
+	EXPECT_TRUE(ok);
+	// Each item takes a little over 1000 bytes, so about 39 survive whole.
+	ASSERT_GE(back.size(), 30u);
+	ASSERT_LT(back.size(), 60u);
+	for (size_t i = 0; i < back.size(); ++i)
+		EXPECT_EQ(items[i].content, back[i].content) << i;
+}
+
+TEST(TodoListRoundTrip, ContentTypesAndStates)
+{
+	const std::vector<MemoTodoListItem> items = {
+	    item(MEMO_BOX_ITEM_FIRST_TEXT, false, std::string("Tom &amp; Jerry &lt;3 &gt;<br/>") + IMAGE + "end"),
+	    item(MEMO_BOX_ITEM_CHECK, true, "done &amp; dusted"),
+	    item(MEMO_BOX_ITEM_CHECK, false, "open<br/>pasted"),
+	    item(MEMO_BOX_ITEM_TEXT, false, "\xE2\x9C\x93 \"quoted\" 'single'"),
+	};
+	bool ok = false;
+	const std::vector<MemoTodoListItem> back = parse(compose(items), &ok);
+	EXPECT_TRUE(ok);
+	ASSERT_EQ(items.size(), back.size());
+	for (size_t i = 0; i < items.size(); ++i) {
+		EXPECT_EQ(items[i].type, back[i].type) << i;
+		EXPECT_EQ(items[i].checked, back[i].checked) << i;
+		EXPECT_EQ(items[i].content, back[i].content) << i;
+	}
+}
+
+TEST(TodoListRoundTrip, FirstSurvivingItemBecomesFirst)
+{
+	// The empty head is dropped at save, so the check item behind it comes back first.
+	const std::vector<MemoTodoListItem> back =
+	    parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, ""), item(MEMO_BOX_ITEM_CHECK, true, "a"),
+	                   item(MEMO_BOX_ITEM_TEXT, false, "b")}));
+	ASSERT_EQ(2u, back.size());
+	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, back[0].type);
+	EXPECT_TRUE(back[0].checked);
+	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, back[1].type);
+	// Items read behind existing body items are never first.
+	const std::vector<MemoTodoListItem> behind =
+	    parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, "x")}), nullptr, 1);
+	ASSERT_EQ(1u, behind.size());
+	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, behind[0].type);
+}
+
+TEST(TodoListReader, StatedSlips)
+{
+	const std::string xml =
+	    "<todolist>\n"
+	    "<todolist_item todo_item_type=\"2\" todo_item_state=\"false\" todo_item_content=\"gone\"/>\n"
+	    "<todolist_item todo_item_type=\"1\" todo_item_state=\"TRUE\" todo_item_content=\"a\"/>\n"
+	    "<todolist_item todo_item_type=\"1\" todo_item_content=\"b\"/>\n"
+	    "<todolist_item todo_item_type=\"1\" todo_item_state=\"false\" todo_item_content=\"c\"/>\n"
+	    "<todolist_item todo_item_state=\"false\" todo_item_content=\"no type\"/>\n"
+	    "<todolist_item todo_item_type=\"0\" todo_item_state=\"true\"/>\n"
+	    "</todolist>\n";
+	const std::vector<MemoTodoListItem> back = parse(xml);
+	ASSERT_EQ(4u, back.size());
+	// Type "2" made nothing, so "a" is the first item; "TRUE" and a missing state tick.
+	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, back[0].type);
+	EXPECT_TRUE(back[0].checked);
+	EXPECT_TRUE(back[1].checked);
+	EXPECT_FALSE(back[2].checked);
+	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, back[3].type);
+	EXPECT_FALSE(back[3].checked);
+	EXPECT_EQ("", back[3].content);
+}
+
+TEST(TodoListReader, RootWithoutItemsAndUnreadableDocuments)
+{
+	bool ok = false;
+	EXPECT_TRUE(parse("<todolist></todolist>", &ok).empty());
+	EXPECT_TRUE(ok);
+	EXPECT_TRUE(parse("<todolist/>", &ok).empty());
+	EXPECT_TRUE(ok);
+	// A written-out item is read once, not again at its closing tag.
+	EXPECT_EQ(1u, parse("<todolist><todolist_item todo_item_type=\"0\" todo_item_content=\"x\"></todolist_item>"
+	                    "</todolist>")
+	                  .size());
+
+	for (const char *bad : {"", "not xml", "<"}) {
+		const std::vector<MemoTodoListItem> back = parse(bad, &ok);
+		EXPECT_FALSE(ok) << bad;
+		ASSERT_EQ(1u, back.size()) << bad;
+		EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, back[0].type);
+		EXPECT_EQ("", back[0].content);
+	}
+	std::vector<MemoTodoListItem> items;
+	EXPECT_FALSE(memoParseTodoListXml(nullptr, items));
+	EXPECT_EQ(1u, items.size());
+}
+
+TEST(TodoListReader, ErrorAfterFirstNodeKeepsItemsSoFar)
+{
+	// An unescaped quote behind earlier items, as the quick memo append can leave it. The reader
+	// parses ahead, so the error must lie well behind the first node to be met after it.
+	std::string head = "<todolist>\n";
+	for (int i = 0; i < 4; ++i)
+		head += "<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"one " +
+		        std::string(1000, 'x') + "\"/>\n";
+	const std::string broken =
+	    "<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"say \"hi\"\"/></todolist>";
+	bool ok = false;
+	std::vector<MemoTodoListItem> back = parse(head + broken, &ok);
+	EXPECT_TRUE(ok);
+	ASSERT_GE(back.size(), 1u);
+	ASSERT_LE(back.size(), 4u);
+	for (const MemoTodoListItem &i : back)
+		EXPECT_EQ(0u, i.content.find("one x"));
+
+	// In a short document the error is met at once: the memo opens empty.
+	back = parse("<todolist>\n" + broken, &ok);
+	EXPECT_FALSE(ok);
+	ASSERT_EQ(1u, back.size());
+	EXPECT_EQ("", back[0].content);
+}

@@ -1,0 +1,152 @@
+// The connection: first-run schema and rows, what counts as an existing file, the two
+// statement helpers.
+#include "store_test_fixture.h"
+
+#include <fstream>
+#include <sys/stat.h>
+
+#include <Ecore_File.h>
+
+using namespace store_test;
+
+namespace
+{
+// The schema text both sides of memo.db depend on, tabs and typos included
+// (as stored by SQLite: without the closing ";").
+const char *const kSchema[] = {
+	"CREATE TABLE memo(_id\tINTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,isDirty INTEGER NOT NULL "
+	"DEFAULT 0,isDeleted\tINTEGER NOT NULL DEFAULT 0,\taccountType TEXT,\taccountName TEXT DEFAULT '', sync1 "
+	"INTEGER,sync2 TEXT,isNeedUpsync\tINTEGER NOT NULL DEFAULT 0,\tcreatedAt INTEGER NOT NULL,\tlastModifiedAt "
+	"INTEGER NOT NULL,\tcategoryUUID\tTEXT NOT NULL DEFAULT '',title TEXT NOT NULL DEFAULT '',content TEXT NOT NULL "
+	"DEFAULT '',tizenXmlContent TEXT NOT NULL DEFAULT '',xmlContent TEXT DEFAULT '',display_Content TEXT NOT NULL "
+	"DEFAULT '',vrfileUUID TEXT NOT NULL DEFAULT '',strippedContent TEXT NOT NULL DEFAULT '',_data TEXT NOT NULL "
+	"DEFAULT '',_phoneNum TEXT,isFavorite INTERGER NOT NULL DEFAULT 0,isHidden INTERGER DEFAULT 0,isQuick INTERGER "
+	"DEFAULT 0,isSynced INTERGER DEFAULT 0,bgColor TEXT NOT NULL DEFAULT '')",
+	"CREATE TABLE category (_id INTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,\tisDirty INTEGER NOT "
+	"NULL DEFAULT 0,isDeleted INTEGERNOT NULL DEFAULT 0,accountType TEXT,accountName TEXT DEFAULT '',\tsync1 "
+	"INTEGER,\tsync2 TEXT,\tisNeedUpsync INTEGER NOT NULL DEFAULT 0, orderBy INTEGER NOT NULL DEFAULT "
+	"999999,_display_name TEXT NOT NULL)",
+	"CREATE TABLE file (_id INTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,isDirty INTEGER NOT NULL "
+	"DEFAULT 0,isDeleted INTEGER NOT NULL DEFAULT 0,accountType TEXT,accountName TEXT DEFAULT '',sync1 INTEGER,sync2 "
+	"TEXT,isNeedUpsync INTEGER NOT NULL DEFAULT 0,memoUUID TEXT NOT NULL DEFAULT '',mime_type TEXT NOT NULL DEFAULT "
+	"'application/octet-stream',\t_display_name TEXT NOT NULL DEFAULT '',\t_size INTEGER NOT NULL DEFAULT "
+	"0,\torientation INTEGER NOT NULL DEFAULT 0,\tpath TEXT NOT NULL, _data TEXT NOT NULL)",
+	"CREATE TABLE android_metadata (locale TEXT)",
+	"CREATE TABLE password (hiddenPass TEXT)",
+	"CREATE TRIGGER delete_file DELETE ON memo BEGIN DELETE FROM file WHERE memoUUID = old.UUID; END",
+};
+
+std::string schemaObject(int index)
+{
+	return query("SELECT sql FROM sqlite_master WHERE sql IS NOT NULL AND name NOT LIKE 'sqlite_%' ORDER BY rowid "
+				 "LIMIT 1 OFFSET " +
+				 std::to_string(index));
+}
+} // namespace
+
+using DbSchema = StoreTest;
+
+TEST_F(DbSchema, FirstRunCreatesExactSchemaAndRows)
+{
+	ASSERT_NE(nullptr, db());
+	EXPECT_EQ(6, queryInt("SELECT count(*) FROM sqlite_master WHERE sql IS NOT NULL AND name NOT LIKE 'sqlite_%'"));
+	for (int i = 0; i < 6; ++i)
+		EXPECT_EQ(kSchema[i], schemaObject(i)) << "object " << i;
+
+	EXPECT_EQ("TempDataForQ7", query("SELECT locale FROM android_metadata"));
+	EXPECT_EQ(1, queryInt("SELECT count(*) FROM android_metadata"));
+	EXPECT_EQ("", query("SELECT hiddenPass FROM password"));
+	EXPECT_EQ(1, queryInt("SELECT count(*) FROM password"));
+
+	// The quick memo row is the first memo, clean, with its colour and media folder.
+	EXPECT_EQ(1, queryInt("SELECT count(*) FROM memo"));
+	EXPECT_EQ(1, queryInt("SELECT _id FROM memo WHERE isQuick = 1"));
+	EXPECT_EQ(0, queryInt("SELECT isDirty FROM memo WHERE _id = 1"));
+	EXPECT_EQ("252;191;169;255;", query("SELECT bgColor FROM memo WHERE _id = 1"));
+	EXPECT_NE("", query("SELECT title FROM memo WHERE _id = 1"));
+	long long created = queryInt("SELECT createdAt FROM memo WHERE _id = 1");
+	EXPECT_EQ(0, created % 1000);
+	EXPECT_EQ(created, queryInt("SELECT lastModifiedAt FROM memo WHERE _id = 1"));
+	std::string uuid = query("SELECT UUID FROM memo WHERE _id = 1");
+	EXPECT_TRUE(ecore_file_is_dir((dataPath() + "media/" + uuid).c_str()));
+}
+
+TEST_F(DbSchema, RemovedFileRunsFirstRunAgain)
+{
+	ASSERT_NE(nullptr, db());
+	std::string first = query("SELECT UUID FROM memo WHERE isQuick = 1");
+	ASSERT_EQ(36u, first.size());
+	MemoDbMgr::destroy();
+	ASSERT_EQ(0, unlink(dbPath().c_str()));
+	ASSERT_NE(nullptr, db());
+	std::string second = query("SELECT UUID FROM memo WHERE isQuick = 1");
+	EXPECT_EQ(36u, second.size());
+	EXPECT_NE(first, second);
+	EXPECT_EQ(1, queryInt("SELECT count(*) FROM memo"));
+}
+
+TEST_F(DbSchema, ExistingFileIsNeverCompleted)
+{
+	// A zero-length file counts as a database: nothing is created, every query fails to prepare.
+	std::ofstream(dbPath()).close();
+	ASSERT_NE(nullptr, db());
+	EXPECT_EQ(-1, db()->getMemoCount());
+	EXPECT_TRUE(logContains("[createSqliteStmt]ERROR(1)."));
+	MemoItemList *list = db()->getVisibleMemoListN();
+	ASSERT_NE(nullptr, list);
+	EXPECT_EQ(0, list->getCount());
+	delete list;
+	EXPECT_FALSE(db()->addQuickMemo("x"));
+	EXPECT_EQ(-1, db()->excuteSql("UPDATE memo SET isFavorite = 1"));
+	EXPECT_TRUE(logContains("[excute_sql]ERROR(1)."));
+	MemoDbMgr::destroy();
+	EXPECT_EQ(0, queryInt("SELECT count(*) FROM sqlite_master"));
+}
+
+TEST_F(DbSchema, WithoutTheFeatureNoQuickMemoIsMade)
+{
+	vconf_set_int("db/desktop/csc/feature_92", 0);
+	ASSERT_NE(nullptr, db());
+	EXPECT_EQ(0, queryInt("SELECT count(*) FROM memo"));
+	EXPECT_EQ(0, db()->getMemoCount());
+	EXPECT_EQ(6, queryInt("SELECT count(*) FROM sqlite_master WHERE sql IS NOT NULL AND name NOT LIKE 'sqlite_%'"));
+}
+
+TEST_F(DbSchema, UnopenableFileLeavesAWorkingProcess)
+{
+	// A folder where the file should be: opening fails, later queries fail and say so.
+	ASSERT_EQ(0, mkdir(dbPath().c_str(), 0700));
+	MemoDbMgr *mgr = db();
+	ASSERT_NE(nullptr, mgr);
+	EXPECT_TRUE(logContains("DB busy ("));
+	EXPECT_EQ(-1, mgr->getMemoCount());
+	MemoDocInfo *info = mgr->getOneMemoN("any");
+	ASSERT_NE(nullptr, info);
+	delete info;
+	MemoDbMgr::destroy();
+	rmdir(dbPath().c_str());
+}
+
+TEST_F(DbSchema, ExcuteSqlFormatsQuotesAndReportsCodes)
+{
+	ASSERT_NE(nullptr, db());
+	EXPECT_EQ(SQLITE_OK, db()->excuteSql("INSERT INTO android_metadata(locale) VALUES('%q')", "it's 100%"));
+	EXPECT_EQ(1, queryInt("SELECT count(*) FROM android_metadata WHERE locale = 'it''s 100%'"));
+	char plain[] = "INSERT INTO android_metadata(locale) VALUES('50%')";
+	EXPECT_EQ(SQLITE_OK, db()->excuteSql(plain));
+	EXPECT_EQ(1, queryInt("SELECT count(*) FROM android_metadata WHERE locale = '50%'"));
+	// Prepares but fails to run: the code of the run comes back.
+	EXPECT_EQ(SQLITE_CONSTRAINT, db()->excuteSql("INSERT INTO memo(UUID) VALUES('x')"));
+	char broken[] = "SELEKT 1";
+	EXPECT_EQ(-1, db()->excuteSql(broken));
+}
+
+TEST_F(DbSchema, InstanceIsBuiltOnceAndAnewAfterDestroy)
+{
+	MemoDbMgr *first = db();
+	EXPECT_EQ(first, db());
+	MemoDbMgr::destroy();
+	MemoDbMgr::destroy(); // twice is harmless
+	ASSERT_NE(nullptr, db());
+	EXPECT_EQ(1, db()->getMemoCount());
+}

@@ -1,0 +1,170 @@
+// Pictures made on the spot for the image helper tests: JPEG and PNG files from a colour
+// function, EXIF orientation tags, header-only size patches, and pixel read-back.
+#ifndef TESTS_CORE_UTIL_IMAGE_FIXTURE_H
+#define TESTS_CORE_UTIL_IMAGE_FIXTURE_H
+
+#include "TestEnv.h"
+
+#include <Ecore_Evas.h>
+#include <Evas.h>
+#include <gtest/gtest.h>
+#include <image_util.h>
+#include <libexif/exif-data.h>
+
+#include <cstdint>
+#include <cstdio>
+#include <cstdlib>
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace image_fixture
+{
+// 0xAARRGGBB colours of test patterns.
+const uint32_t RED = 0xffff0000, GREEN = 0xff00ff00, BLUE = 0xff0000ff, YELLOW = 0xffffff00;
+
+using ColorFn = std::function<uint32_t(int x, int y)>;
+
+// The canvas the Evas-side helpers need; one per test suite.
+class ImageTest : public ::testing::Test
+{
+protected:
+	static void SetUpTestSuite() { ecore_evas_init(); }
+	static void TearDownTestSuite() { ecore_evas_shutdown(); }
+	void SetUp() override
+	{
+		dir = memo_test::makeTempDir(::testing::UnitTest::GetInstance()->current_test_info()->name());
+	}
+	std::string path(const std::string &name) const { return dir + "/" + name; }
+	std::string dir;
+};
+
+inline void writeJpeg(const std::string &path, int w, int h, const ColorFn &color)
+{
+	std::vector<unsigned char> rgb(static_cast<size_t>(w) * h * 3);
+	for (int y = 0; y < h; y++)
+		for (int x = 0; x < w; x++) {
+			uint32_t c = color(x, y);
+			unsigned char *p = &rgb[(static_cast<size_t>(y) * w + x) * 3];
+			p[0] = (c >> 16) & 0xff;
+			p[1] = (c >> 8) & 0xff;
+			p[2] = c & 0xff;
+		}
+	ASSERT_EQ(IMAGE_UTIL_ERROR_NONE,
+	          image_util_encode_jpeg(rgb.data(), w, h, IMAGE_UTIL_COLORSPACE_RGB888, 95, path.c_str()));
+}
+
+// Writes any format Evas can save (by extension), through a throw-away buffer canvas.
+inline void writeEvasImage(const std::string &path, int w, int h, const ColorFn &color)
+{
+	Ecore_Evas *ee = ecore_evas_buffer_new(1, 1);
+	ASSERT_NE(nullptr, ee);
+	Evas_Object *img = evas_object_image_add(ecore_evas_get(ee));
+	evas_object_image_size_set(img, w, h);
+	uint32_t *px = static_cast<uint32_t *>(evas_object_image_data_get(img, EINA_TRUE));
+	ASSERT_NE(nullptr, px);
+	int stride = evas_object_image_stride_get(img) / 4;
+	for (int y = 0; y < h; y++)
+		for (int x = 0; x < w; x++)
+			px[y * stride + x] = color(x, y);
+	evas_object_image_data_set(img, px);
+	EXPECT_TRUE(evas_object_image_save(img, path.c_str(), nullptr, "compress=1"));
+	ecore_evas_free(ee);
+}
+
+struct Picture {
+	int w = 0, h = 0;
+	std::vector<uint32_t> px; // 0xAARRGGBB
+	uint32_t at(int x, int y) const { return px[static_cast<size_t>(y) * w + x]; }
+};
+
+// Loads any picture through Evas; an empty Picture when it cannot be read.
+inline Picture readImage(const std::string &path)
+{
+	Picture pic;
+	Ecore_Evas *ee = ecore_evas_buffer_new(1, 1);
+	Evas_Object *img = evas_object_image_add(ecore_evas_get(ee));
+	evas_object_image_file_set(img, path.c_str(), nullptr);
+	evas_object_image_size_get(img, &pic.w, &pic.h);
+	const uint32_t *px = static_cast<const uint32_t *>(evas_object_image_data_get(img, EINA_FALSE));
+	if (px && pic.w > 0) {
+		int stride = evas_object_image_stride_get(img) / 4;
+		for (int y = 0; y < pic.h; y++)
+			pic.px.insert(pic.px.end(), px + y * stride, px + y * stride + pic.w);
+	} else {
+		pic.w = pic.h = 0;
+	}
+	ecore_evas_free(ee);
+	return pic;
+}
+
+// True when the colours differ by at most tol in each of red, green and blue (lossy files).
+inline bool near(uint32_t a, uint32_t b, int tol = 40)
+{
+	for (int shift = 0; shift <= 16; shift += 8)
+		if (std::abs(static_cast<int>((a >> shift) & 0xff) - static_cast<int>((b >> shift) & 0xff)) > tol)
+			return false;
+	return true;
+}
+
+inline std::vector<unsigned char> readBytes(const std::string &path)
+{
+	std::string s = memo_test::readFile(path);
+	return std::vector<unsigned char>(s.begin(), s.end());
+}
+
+inline void writeBytes(const std::string &path, const std::vector<unsigned char> &bytes)
+{
+	FILE *f = fopen(path.c_str(), "wb");
+	ASSERT_NE(nullptr, f);
+	fwrite(bytes.data(), 1, bytes.size(), f);
+	fclose(f);
+}
+
+// Rewrites the frame header of a JPEG so that it claims w x h; the pixel data stays small.
+inline void patchJpegSize(const std::string &path, int w, int h)
+{
+	std::vector<unsigned char> b = readBytes(path);
+	for (size_t i = 2; i + 8 < b.size(); i++)
+		if (b[i] == 0xff && b[i + 1] == 0xc0) {
+			b[i + 5] = h >> 8;
+			b[i + 6] = h & 0xff;
+			b[i + 7] = w >> 8;
+			b[i + 8] = w & 0xff;
+			writeBytes(path, b);
+			return;
+		}
+	FAIL() << "no frame header in " << path;
+}
+
+// Puts an APP1 EXIF block holding only the orientation tag, in the given byte order, right
+// behind the JPEG's start marker.
+inline void addExifOrientation(const std::string &path, int orientation, ExifByteOrder order = EXIF_BYTE_ORDER_INTEL)
+{
+	ExifData *exif = exif_data_new();
+	exif_data_set_byte_order(exif, order);
+	ExifEntry *entry = exif_entry_new();
+	exif_content_add_entry(exif->ifd[EXIF_IFD_0], entry);
+	exif_entry_initialize(entry, EXIF_TAG_ORIENTATION);
+	exif_set_short(entry->data, order, static_cast<ExifShort>(orientation));
+	exif_entry_unref(entry);
+	unsigned char *data = nullptr;
+	unsigned int len = 0;
+	exif_data_save_data(exif, &data, &len);
+	exif_data_unref(exif);
+	ASSERT_NE(nullptr, data);
+
+	std::vector<unsigned char> jpeg = readBytes(path);
+	std::vector<unsigned char> out(jpeg.begin(), jpeg.begin() + 2);
+	out.push_back(0xff);
+	out.push_back(0xe1);
+	out.push_back(((len + 2) >> 8) & 0xff);
+	out.push_back((len + 2) & 0xff);
+	out.insert(out.end(), data, data + len);
+	out.insert(out.end(), jpeg.begin() + 2, jpeg.end());
+	free(data);
+	writeBytes(path, out);
+}
+} // namespace image_fixture
+
+#endif

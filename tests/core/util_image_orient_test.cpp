@@ -1,0 +1,153 @@
+// EXIF orientation of pictures and turning them upright in place
+// (MemoUtil::getOrient, MemoUtil::rotateImage).
+#include "Util/MemoUtil.h"
+#include "util_image_fixture.h"
+
+using namespace image_fixture;
+
+namespace
+{
+// The upright picture: four quadrants of different colours, 64 x 32.
+const int UW = 64, UH = 32;
+uint32_t upright(int x, int y)
+{
+	if (y < UH / 2)
+		return x < UW / 2 ? RED : GREEN;
+	return x < UW / 2 ? BLUE : YELLOW;
+}
+
+// Where a stored pixel (x, y) of a w x h file shows once the viewer applies the orientation.
+void displayed(int orientation, int w, int h, int x, int y, int *dx, int *dy)
+{
+	switch (orientation) {
+	case 2:
+		*dx = w - 1 - x, *dy = y;
+		break;
+	case 3:
+		*dx = w - 1 - x, *dy = h - 1 - y;
+		break;
+	case 4:
+		*dx = x, *dy = h - 1 - y;
+		break;
+	case 5:
+		*dx = y, *dy = x;
+		break;
+	case 6:
+		*dx = h - 1 - y, *dy = x;
+		break;
+	case 7:
+		*dx = h - 1 - y, *dy = w - 1 - x;
+		break;
+	case 8:
+		*dx = y, *dy = w - 1 - x;
+		break;
+	default:
+		*dx = x, *dy = y;
+		break;
+	}
+}
+
+// What a camera stores for the upright picture under this orientation.
+struct Stored {
+	int w, h;
+	int orientation;
+	uint32_t operator()(int x, int y) const
+	{
+		int dx, dy;
+		displayed(orientation, w, h, x, y, &dx, &dy);
+		return upright(dx, dy);
+	}
+};
+
+Stored storedFor(int orientation)
+{
+	bool sideways = orientation >= 5;
+	return Stored{sideways ? UH : UW, sideways ? UW : UH, orientation};
+}
+
+// Compares a picture with a colour function at the centre of each 16 x 16 block.
+void expectPicture(const Picture &pic, int w, int h, const ColorFn &color)
+{
+	ASSERT_EQ(w, pic.w);
+	ASSERT_EQ(h, pic.h);
+	for (int y = 8; y < h; y += 16)
+		for (int x = 8; x < w; x += 16)
+			EXPECT_TRUE(near(color(x, y), pic.at(x, y)))
+			    << "at " << x << "," << y << std::hex << ": " << pic.at(x, y) << " instead of " << color(x, y);
+}
+
+class Orientation : public ImageTest
+{
+};
+
+TEST_F(Orientation, ReadsTheTagInEitherByteOrder)
+{
+	std::string p = path("a.jpg");
+	writeJpeg(p, 32, 32, upright);
+	EXPECT_EQ(0, MemoUtil::getOrient(p.c_str()));
+
+	addExifOrientation(p, 6);
+	EXPECT_EQ(6, MemoUtil::getOrient(p.c_str()));
+
+	std::string q = path("b.jpg");
+	writeJpeg(q, 32, 32, upright);
+	addExifOrientation(q, 8, EXIF_BYTE_ORDER_MOTOROLA);
+	EXPECT_EQ(8, MemoUtil::getOrient(q.c_str()));
+
+	EXPECT_EQ(0, MemoUtil::getOrient(path("missing.jpg").c_str()));
+	EXPECT_EQ(0, MemoUtil::getOrient(nullptr));
+}
+
+// The flow of the editor: read the tag of the copy, then turn the copy in place. Turned
+// orientations come out upright; the mirrored ones (2, 4, 5, 7) stay as stored.
+TEST_F(Orientation, EightOrientationsThroughTheEditorFlow)
+{
+	for (int o = 1; o <= 8; o++) {
+		SCOPED_TRACE("orientation " + std::to_string(o));
+		Stored stored = storedFor(o);
+		std::string p = path("o" + std::to_string(o) + ".jpg");
+		writeJpeg(p, stored.w, stored.h, stored);
+		addExifOrientation(p, o);
+
+		int orient = MemoUtil::getOrient(p.c_str());
+		EXPECT_EQ(o, orient);
+		MemoUtil::rotateImage(p.c_str(), orient);
+
+		Picture pic = readImage(p);
+		if (o == 1 || o == 3 || o == 6 || o == 8)
+			expectPicture(pic, UW, UH, upright);
+		else
+			expectPicture(pic, stored.w, stored.h, stored);
+		// Rewritten without EXIF, so nothing turns it a second time.
+		EXPECT_EQ(0, MemoUtil::getOrient(p.c_str()));
+	}
+}
+
+TEST_F(Orientation, OnlyJpgNamesAreTurned)
+{
+	std::string jpeg = path("a.jpeg");
+	writeJpeg(jpeg, 64, 32, upright);
+	addExifOrientation(jpeg, 6);
+	std::string before = memo_test::readFile(jpeg);
+	MemoUtil::rotateImage(jpeg.c_str(), 6);
+	EXPECT_EQ(before, memo_test::readFile(jpeg));
+
+	std::string png = path("a.png");
+	writeEvasImage(png, 64, 32, upright);
+	before = memo_test::readFile(png);
+	MemoUtil::rotateImage(png.c_str(), 3);
+	EXPECT_EQ(before, memo_test::readFile(png));
+
+	MemoUtil::rotateImage(path("missing.jpg").c_str(), 6);
+	MemoUtil::rotateImage(nullptr, 6);
+}
+
+// A damaged file is left alone rather than replaced by an empty picture.
+TEST_F(Orientation, UndecodableJpgStaysAsItWas)
+{
+	std::string p = path("broken.jpg");
+	writeBytes(p, {0xff, 0xd8, 0xff, 0xe0, 0x00});
+	MemoUtil::rotateImage(p.c_str(), 6);
+	EXPECT_EQ(5u, readBytes(p).size());
+}
+} // namespace

@@ -1,0 +1,122 @@
+// Device settings read through vconf, their change callbacks, and argument checks.
+#include <gtest/gtest.h>
+#include <system_settings.h>
+#include <vconf.h>
+
+#include <Ecore.h>
+
+#include <cstdlib>
+#include <string>
+#include <vector>
+
+#include "TestEnv.h"
+
+namespace
+{
+std::string getString(system_settings_key_e key, int *rc = nullptr)
+{
+	char *value = nullptr;
+	int r = system_settings_get_value_string(key, &value);
+	if (rc)
+		*rc = r;
+	std::string s = value ? value : "<null>";
+	free(value);
+	return s;
+}
+
+void changedCb(system_settings_key_e key, void *data)
+{
+	static_cast<std::vector<int> *>(data)->push_back(key);
+}
+
+class SystemSettings : public testing::Test
+{
+protected:
+	void SetUp() override { ecore_init(); }
+	void TearDown() override { ecore_shutdown(); }
+};
+} // namespace
+
+TEST_F(SystemSettings, LocaleKeysComeFromVconfWithoutCodeset)
+{
+	EXPECT_EQ(13, SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE);
+	EXPECT_EQ(10, SYSTEM_SETTINGS_KEY_LOCKSCREEN_APP);
+	ASSERT_EQ(VCONF_OK, vconf_set_str(VCONFKEY_LANGSET, "de_DE.UTF-8"));
+	ASSERT_EQ(VCONF_OK, vconf_set_str(VCONFKEY_REGIONFORMAT, "ko_KR.UTF-8"));
+	EXPECT_EQ("de_DE", getString(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE));
+	EXPECT_EQ("ko_KR", getString(SYSTEM_SETTINGS_KEY_LOCALE_COUNTRY));
+
+	bool is24 = true;
+	ASSERT_EQ(VCONF_OK, vconf_set_int(VCONFKEY_REGIONFORMAT_TIME1224, VCONFKEY_TIME_FORMAT_12));
+	ASSERT_EQ(SYSTEM_SETTINGS_ERROR_NONE,
+	          system_settings_get_value_bool(SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR, &is24));
+	EXPECT_FALSE(is24);
+	ASSERT_EQ(SYSTEM_SETTINGS_ERROR_NONE,
+	          system_settings_set_value_bool(SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR, true));
+	int format = 0;
+	ASSERT_EQ(VCONF_OK, vconf_get_int(VCONFKEY_REGIONFORMAT_TIME1224, &format));
+	EXPECT_EQ(VCONFKEY_TIME_FORMAT_24, format);
+
+	ASSERT_EQ(VCONF_OK, vconf_set_str(VCONFKEY_SETAPPL_TIMEZONE_ID, "Asia/Seoul"));
+	EXPECT_EQ("Asia/Seoul", getString(SYSTEM_SETTINGS_KEY_LOCALE_TIMEZONE));
+	ASSERT_EQ(VCONF_OK, vconf_unset(VCONFKEY_SETAPPL_TIMEZONE_ID));
+	EXPECT_NE("", getString(SYSTEM_SETTINGS_KEY_LOCALE_TIMEZONE)) << "the host's zone";
+
+	ASSERT_EQ(SYSTEM_SETTINGS_ERROR_NONE,
+	          system_settings_set_value_string(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE, "fr_FR"));
+	char *langset = vconf_get_str(VCONFKEY_LANGSET);
+	EXPECT_STREQ("fr_FR.UTF-8", langset);
+	free(langset);
+
+	int size = -1;
+	ASSERT_EQ(SYSTEM_SETTINGS_ERROR_NONE, system_settings_get_value_int(SYSTEM_SETTINGS_KEY_FONT_SIZE, &size));
+	EXPECT_EQ(SYSTEM_SETTINGS_FONT_SIZE_NORMAL, size);
+	bool silent = true;
+	ASSERT_EQ(VCONF_OK, vconf_set_bool(VCONFKEY_SETAPPL_SOUND_STATUS_BOOL, 1));
+	ASSERT_EQ(SYSTEM_SETTINGS_ERROR_NONE,
+	          system_settings_get_value_bool(SYSTEM_SETTINGS_KEY_SOUND_SILENT_MODE, &silent));
+	EXPECT_FALSE(silent);
+}
+
+TEST_F(SystemSettings, WrongTypesUnsupportedKeysAndNulls)
+{
+	int i = 0;
+	bool b = false;
+	int rc = 0;
+	getString(SYSTEM_SETTINGS_KEY_FONT_SIZE, &rc);
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER, rc);
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER,
+	          system_settings_get_value_int(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE, &i));
+	getString(SYSTEM_SETTINGS_KEY_MAX, &rc);
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER, rc);
+	getString(static_cast<system_settings_key_e>(-1), &rc);
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER, rc);
+	getString(SYSTEM_SETTINGS_KEY_INCOMING_CALL_RINGTONE, &rc);
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_NOT_SUPPORTED, rc);
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER,
+	          system_settings_get_value_string(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE, nullptr));
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER,
+	          system_settings_get_value_int(SYSTEM_SETTINGS_KEY_FONT_SIZE, nullptr));
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER,
+	          system_settings_get_value_bool(SYSTEM_SETTINGS_KEY_SOUND_TOUCH, nullptr));
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER,
+	          system_settings_set_value_string(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE, nullptr));
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER, system_settings_set_value_int(SYSTEM_SETTINGS_KEY_FONT_SIZE, 9));
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER,
+	          system_settings_set_changed_cb(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE, nullptr, nullptr));
+	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_NOT_SUPPORTED, system_settings_get_value_bool(SYSTEM_SETTINGS_KEY_LOCK_STATE, &b));
+}
+
+TEST_F(SystemSettings, ChangedCallbackFollowsTheVconfKeyUntilUnset)
+{
+	std::vector<int> seen;
+	ASSERT_EQ(SYSTEM_SETTINGS_ERROR_NONE,
+	          system_settings_set_changed_cb(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE, changedCb, &seen));
+	ASSERT_EQ(VCONF_OK, vconf_set_str(VCONFKEY_LANGSET, "ko_KR.UTF-8"));
+	ASSERT_TRUE(memo_test::pump(5, [&] { return seen.size() == 1; }));
+	EXPECT_EQ(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE, seen[0]);
+	ASSERT_EQ(SYSTEM_SETTINGS_ERROR_NONE, system_settings_unset_changed_cb(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE));
+	ASSERT_EQ(VCONF_OK, vconf_set_str(VCONFKEY_LANGSET, "en_US.UTF-8"));
+	memo_test::pumpFor(0.3);
+	EXPECT_EQ(1u, seen.size());
+}

@@ -1,0 +1,124 @@
+// vconf change notices across processes, and the vconftool command line.
+#include <gtest/gtest.h>
+#include <vconf.h>
+
+#include <Ecore.h>
+
+#include <cstdlib>
+#include <string>
+#include <vector>
+
+#include "TestEnv.h"
+
+namespace
+{
+struct Seen {
+	std::vector<std::string> events; // "<tag>:<key>=<value>"
+};
+
+std::string describe(keynode_t *node)
+{
+	std::string s = std::string(vconf_keynode_get_name(node)) + "=";
+	switch (vconf_keynode_get_type(node)) {
+	case VCONF_TYPE_INT:
+		return s + std::to_string(vconf_keynode_get_int(node));
+	case VCONF_TYPE_BOOL:
+		return s + (vconf_keynode_get_bool(node) ? "true" : "false");
+	case VCONF_TYPE_STRING:
+		return s + "'" + vconf_keynode_get_str(node) + "'";
+	default:
+		return s + "?";
+	}
+}
+
+void firstCb(keynode_t *node, void *data)
+{
+	static_cast<Seen *>(data)->events.push_back("1:" + describe(node));
+}
+
+void secondCb(keynode_t *node, void *data)
+{
+	static_cast<Seen *>(data)->events.push_back("2:" + describe(node));
+}
+
+class VconfNotify : public testing::Test
+{
+protected:
+	void SetUp() override { ecore_init(); }
+	void TearDown() override { ecore_shutdown(); }
+
+	static int vconftool(const std::string &args, std::string *out = nullptr)
+	{
+		return memo_test::runCommand(std::string(TEST_BIN_DIR "/vconftool ") + args + " 2>/dev/null", out);
+	}
+};
+} // namespace
+
+TEST_F(VconfNotify, ChangesOfAnotherProcessReachEveryCallbackUntilIgnored)
+{
+	Seen seen;
+	// Watching a key that nobody has set yet is allowed.
+	ASSERT_EQ(VCONF_OK, vconf_notify_key_changed("db/setting/timezone_id", firstCb, &seen));
+	ASSERT_EQ(VCONF_OK, vconf_notify_key_changed("db/setting/timezone_id", secondCb, &seen));
+	ASSERT_EQ(VCONF_OK, vconf_notify_key_changed(VCONFKEY_REGIONFORMAT_TIME1224, firstCb, &seen));
+
+	std::string writer = memo_test::helperPath("test_writer");
+	ASSERT_EQ(0, memo_test::runCommand(writer + " vconf-str db/setting/timezone_id Asia/Seoul"));
+	ASSERT_TRUE(memo_test::pump(5, [&] { return seen.events.size() == 2; }));
+	EXPECT_EQ("1:db/setting/timezone_id='Asia/Seoul'", seen.events[0]);
+	EXPECT_EQ("2:db/setting/timezone_id='Asia/Seoul'", seen.events[1]);
+
+	ASSERT_EQ(0, memo_test::runCommand(writer + " vconf-int db/menu_widget/regionformat_time1224 2"));
+	ASSERT_TRUE(memo_test::pump(5, [&] { return seen.events.size() == 3; }));
+	EXPECT_EQ("1:db/menu_widget/regionformat_time1224=2", seen.events[2]);
+
+	ASSERT_EQ(VCONF_OK, vconf_ignore_key_changed("db/setting/timezone_id", firstCb));
+	EXPECT_EQ(VCONF_ERROR, vconf_ignore_key_changed("db/setting/timezone_id", firstCb));
+	// The same value again is still a change.
+	ASSERT_EQ(VCONF_OK, vconf_set_str("db/setting/timezone_id", "Asia/Seoul"));
+	ASSERT_TRUE(memo_test::pump(5, [&] { return seen.events.size() == 4; }));
+	EXPECT_EQ("2:db/setting/timezone_id='Asia/Seoul'", seen.events[3]);
+
+	ASSERT_EQ(VCONF_OK, vconf_ignore_key_changed("db/setting/timezone_id", secondCb));
+	ASSERT_EQ(VCONF_OK, vconf_ignore_key_changed(VCONFKEY_REGIONFORMAT_TIME1224, firstCb));
+	ASSERT_EQ(0, memo_test::runCommand(writer + " vconf-str db/setting/timezone_id UTC"));
+	memo_test::pumpFor(0.3);
+	EXPECT_EQ(4u, seen.events.size());
+}
+
+TEST_F(VconfNotify, VconftoolRoundTrip)
+{
+	Seen seen;
+	ASSERT_EQ(VCONF_OK, vconf_notify_key_changed("db/setting/psmode", firstCb, &seen));
+	// Tizen's argument order, with its ignored install flag.
+	ASSERT_EQ(0, vconftool("set -t int db/setting/psmode 2 -f"));
+	ASSERT_TRUE(memo_test::pump(5, [&] { return seen.events.size() == 1; }));
+	EXPECT_EQ("1:db/setting/psmode=2", seen.events[0]);
+	EXPECT_EQ(VCONF_OK, vconf_ignore_key_changed("db/setting/psmode", firstCb));
+
+	std::string out;
+	ASSERT_EQ(0, vconftool("get db/setting/psmode", &out));
+	EXPECT_EQ("db/setting/psmode, value = 2 (int)\n", out);
+	ASSERT_EQ(0, vconftool("set -t string db/csc/salescode 'K T C'"));
+	ASSERT_EQ(0, vconftool("get db/csc/salescode", &out));
+	EXPECT_EQ("db/csc/salescode, value = K T C (string)\n", out);
+	ASSERT_EQ(0, vconftool("-t bool set db/setting/sound/sound_on false"));
+	int b = 1;
+	ASSERT_EQ(VCONF_OK, vconf_get_bool("db/setting/sound/sound_on", &b));
+	EXPECT_EQ(0, b);
+	ASSERT_EQ(0, vconftool("set -t int memory/call/state -1"));
+	ASSERT_EQ(0, vconftool("get memory/call/state", &out));
+	EXPECT_EQ("memory/call/state, value = -1 (int)\n", out);
+	ASSERT_EQ(0, vconftool("unset memory/call/state"));
+	ASSERT_EQ(0, vconftool("get memory/call/state", &out));
+	EXPECT_EQ("memory/call/state, value = 0 (int)\n", out) << "the seeded default is back";
+
+	EXPECT_EQ(1, vconftool("get db/test/missing"));
+	EXPECT_EQ(1, vconftool("unset db/test/missing"));
+	EXPECT_EQ(2, vconftool("set db/x 1"));
+	EXPECT_EQ(2, vconftool("set -t int db/x one"));
+	EXPECT_EQ(2, vconftool("set -t float db/x 1"));
+	EXPECT_EQ(2, vconftool("get nodb/x"));
+	EXPECT_EQ(2, vconftool("frobnicate db/x"));
+	EXPECT_EQ(2, vconftool(""));
+}
