@@ -18,7 +18,7 @@ public:
 	// Registers eventFunc with data for eventType, replacing this object's previous registration.
 	// Returns false and logs when the platform refuses.
 	bool addEventHandler(app_event_type_e eventType, void (*eventFunc)(app_event_info_h eventInfo, void *data),
-						 void *data);
+	                     void *data);
 	// Unregisters; nothing happens when nothing is registered.
 	void removeEventHandler();
 	// The platform handle, or null when nothing is registered.

@@ -12,10 +12,11 @@
 
 #define WERROR(fmt, arg...)                                                                                            \
 	__dlog_print(LOG_ID_MAIN, DLOG_ERROR, WAPP_LOG_TAG,                                                                \
-				 "%s: %s(%d) > " WAPP_COLOR_RED "* Critical * " fmt WAPP_COLOR_RESET, __MODULE__, __func__, __LINE__, ##arg)
+	             "%s: %s(%d) > " WAPP_COLOR_RED "* Critical * " fmt WAPP_COLOR_RESET, __MODULE__, __func__, __LINE__,  \
+	             ##arg)
 #define WINFO(fmt, arg...)                                                                                             \
 	__dlog_print(LOG_ID_MAIN, DLOG_INFO, WAPP_LOG_TAG, "%s: %s(%d) > " WAPP_COLOR_GREEN fmt WAPP_COLOR_RESET,          \
-				 __MODULE__, __func__, __LINE__, ##arg)
+	             __MODULE__, __func__, __LINE__, ##arg)
 #define WDEBUG(fmt, arg...)                                                                                            \
 	__dlog_print(LOG_ID_MAIN, DLOG_DEBUG, WAPP_LOG_TAG, "%s: %s(%d) > " fmt, __MODULE__, __func__, __LINE__, ##arg)
 

@@ -18,6 +18,8 @@ class WMenuPopupController : public WViewController
 public:
 	WMenuPopupController();
 	const char *getClassName() const override;
+	// Deletes the menu; from inside an item's function the deletion waits until the item's callback is over.
+	void destroy() override;
 
 	// Creates the context popup on naviframe (placed relative to win). Returns false and logs on a null
 	// argument or when the menu exists already.
@@ -45,9 +47,12 @@ private:
 	static void __dismissedCb(void *data, Evas_Object *obj, void *eventInfo);
 	static void __keyCb(void *data, Evas_Object *obj, void *eventInfo);
 	static void __winResizeCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo);
+	static void __deleteJobCb(void *data);
 	void __move();
 
 	Evas_Object *__win;
+	bool __inItemCallback;
+	Ecore_Job *__deleteJob;
 	std::vector<std::unique_ptr<__Item>> __items;
 };
 

@@ -2,6 +2,7 @@
 #define APP_ASSIST_INCLUDE_WNAVIFRAMECONTROLLER_H
 
 #include <functional>
+#include <vector>
 
 #include "WViewController.h"
 
@@ -50,6 +51,8 @@ private:
 	void __scheduleTopCheck();
 
 	std::function<void(bool *)> __lastItemPopCb;
+	// Every page that still points back here, those in a pop transition included.
+	std::vector<WContentViewController *> __pages;
 	Ecore_Job *__topCheckJob;
 	bool __popCbRan;
 };

@@ -23,7 +23,7 @@ public:
 	// Runs timerFunc every seconds (0.0: after the current event) until it returns false. Returns a handle;
 	// an empty function object logs and returns an empty handle.
 	static WUiTimerHandle addTimer(double seconds, std::function<bool(void *)> timerFunc, void *data,
-								   Evas_Object *ownerObj = nullptr);
+	                               Evas_Object *ownerObj = nullptr);
 	// Runs idlerFunc each time the main loop is idle until it returns false.
 	static WUiTimerHandle addIdler(std::function<bool(void *)> idlerFunc, void *data, Evas_Object *ownerObj = nullptr);
 	// Ends the timer or idler of handle; nothing happens when it has ended already.

@@ -53,21 +53,13 @@ bool WApp::onCreate()
 	return true;
 }
 
-void WApp::onTerminate()
-{
-}
+void WApp::onTerminate() {}
 
-void WApp::onPause()
-{
-}
+void WApp::onPause() {}
 
-void WApp::onResume()
-{
-}
+void WApp::onResume() {}
 
-void WApp::onAppControl(app_control_s *, bool)
-{
-}
+void WApp::onAppControl(app_control_s *, bool) {}
 
 void WApp::attachWindowController(WWindowController *windowController)
 {

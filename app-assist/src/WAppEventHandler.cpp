@@ -6,9 +6,7 @@
 namespace app_assist
 {
 
-WAppEventHandler::WAppEventHandler() : __handle(nullptr)
-{
-}
+WAppEventHandler::WAppEventHandler() : __handle(nullptr) {}
 
 WAppEventHandler::~WAppEventHandler()
 {
@@ -16,7 +14,7 @@ WAppEventHandler::~WAppEventHandler()
 }
 
 bool WAppEventHandler::addEventHandler(app_event_type_e eventType,
-									   void (*eventFunc)(app_event_info_h eventInfo, void *data), void *data)
+                                       void (*eventFunc)(app_event_info_h eventInfo, void *data), void *data)
 {
 	if (!eventFunc) {
 		WERROR("eventFunc is null");

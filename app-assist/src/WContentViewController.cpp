@@ -10,8 +10,8 @@ namespace app_assist
 {
 
 WContentViewController::WContentViewController()
-	: __naviframe(nullptr), __naviItem(nullptr), __moreKeyObj(nullptr), __moreKeyCb(nullptr), __covered(false),
-	  __popped(false), __popPending(false)
+    : __naviframe(nullptr), __naviItem(nullptr), __moreKeyObj(nullptr), __moreKeyCb(nullptr), __covered(false),
+      __popped(false), __popPending(false)
 {
 }
 
@@ -24,30 +24,20 @@ WContentViewController::~WContentViewController()
 		__naviframe->__onPageLeft(this);
 }
 
-void WContentViewController::onSetContainerProperties(WNaviframeController *, Evas_Object *)
-{
-}
+void WContentViewController::onSetContainerProperties(WNaviframeController *, Evas_Object *) {}
 
 Elm_Object_Item *WContentViewController::onPushToNaviframe(Evas_Object *naviframeObj)
 {
 	return elm_naviframe_item_push(naviframeObj, nullptr, nullptr, nullptr, getEvasObj(), nullptr);
 }
 
-void WContentViewController::onPushed(Elm_Object_Item *)
-{
-}
+void WContentViewController::onPushed(Elm_Object_Item *) {}
 
-void WContentViewController::onPop()
-{
-}
+void WContentViewController::onPop() {}
 
-void WContentViewController::onBecomeTop()
-{
-}
+void WContentViewController::onBecomeTop() {}
 
-void WContentViewController::onSetAsPageContent(Evas_Object *)
-{
-}
+void WContentViewController::onSetAsPageContent(Evas_Object *) {}
 
 void WContentViewController::onSetMoreButton(Evas_Object *obj, Evas_Smart_Cb callback, void *data)
 {

@@ -4,9 +4,7 @@
 namespace app_assist
 {
 
-WGengridItem::WGengridItem() : __item(nullptr)
-{
-}
+WGengridItem::WGengridItem() : __item(nullptr) {}
 
 WGengridItem::~WGengridItem()
 {
@@ -40,13 +38,9 @@ Elm_Gengrid_Item_Class *WGengridItem::getItemClassNew()
 	return itemClass;
 }
 
-void WGengridItem::onSelect(Evas_Object *)
-{
-}
+void WGengridItem::onSelect(Evas_Object *) {}
 
-void WGengridItem::onSetElmObjectItem(Elm_Object_Item *)
-{
-}
+void WGengridItem::onSetElmObjectItem(Elm_Object_Item *) {}
 
 Elm_Object_Item *WGengridItem::getElmObjectItem() const
 {

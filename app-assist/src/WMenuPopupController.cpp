@@ -8,12 +8,33 @@
 namespace app_assist
 {
 
-WMenuPopupController::WMenuPopupController() : __win(nullptr)
-{
-}
+WMenuPopupController::WMenuPopupController() : __win(nullptr), __inItemCallback(false), __deleteJob(nullptr) {}
 
 WMenuPopupController::~WMenuPopupController()
 {
+	if (__deleteJob)
+		ecore_job_del(__deleteJob);
+	__deleteJob = nullptr;
+}
+
+void WMenuPopupController::destroy()
+{
+	if (!__inItemCallback) {
+		WViewController::destroy();
+		return;
+	}
+	// The context popup must not go while its own item callback runs.
+	if (getEvasObj())
+		evas_object_hide(getEvasObj());
+	if (!__deleteJob)
+		__deleteJob = ecore_job_add(__deleteJobCb, this);
+}
+
+void WMenuPopupController::__deleteJobCb(void *data)
+{
+	WMenuPopupController *self = static_cast<WMenuPopupController *>(data);
+	self->__deleteJob = nullptr;
+	self->destroy();
 }
 
 const char *WMenuPopupController::getClassName() const
@@ -73,7 +94,7 @@ Evas_Object *WMenuPopupController::onCreateView(Evas_Object *parent, void *)
 	}
 	elm_ctxpopup_auto_hide_disabled_set(ctxpopup, EINA_TRUE);
 	elm_ctxpopup_direction_priority_set(ctxpopup, ELM_CTXPOPUP_DIRECTION_UP, ELM_CTXPOPUP_DIRECTION_UNKNOWN,
-										ELM_CTXPOPUP_DIRECTION_UNKNOWN, ELM_CTXPOPUP_DIRECTION_UNKNOWN);
+	                                    ELM_CTXPOPUP_DIRECTION_UNKNOWN, ELM_CTXPOPUP_DIRECTION_UNKNOWN);
 	evas_object_smart_callback_add(ctxpopup, "dismissed", __dismissedCb, this);
 	eext_object_event_callback_add(ctxpopup, EEXT_CALLBACK_BACK, __keyCb, this);
 	eext_object_event_callback_add(ctxpopup, EEXT_CALLBACK_MORE, __keyCb, this);
@@ -99,14 +120,19 @@ void WMenuPopupController::__move()
 	evas_object_move(getEvasObj(), w / 2, h);
 }
 
-void WMenuPopupController::__itemSelectedCb(void *data, Evas_Object *obj, void *)
+void WMenuPopupController::__itemSelectedCb(void *data, Evas_Object *, void *)
 {
 	__Item *item = static_cast<__Item *>(data);
-	// A copy: the function may end the menu, and the item record with it.
+	WMenuPopupController *self = item->menu;
+	WViewControllerWeakPtr alive = self->getWeakPtr();
+	// A copy: should the function end the menu's object, the item record goes with it.
 	std::function<void()> func = item->func;
-	elm_ctxpopup_dismiss(obj);
+	self->__inItemCallback = true;
+	self->destroy();
 	if (func)
 		func();
+	if (!alive.expired())
+		self->__inItemCallback = false;
 }
 
 void WMenuPopupController::__dismissedCb(void *data, Evas_Object *, void *)
@@ -114,9 +140,9 @@ void WMenuPopupController::__dismissedCb(void *data, Evas_Object *, void *)
 	static_cast<WMenuPopupController *>(data)->destroy();
 }
 
-void WMenuPopupController::__keyCb(void *, Evas_Object *obj, void *)
+void WMenuPopupController::__keyCb(void *data, Evas_Object *, void *)
 {
-	elm_ctxpopup_dismiss(obj);
+	static_cast<WMenuPopupController *>(data)->destroy();
 }
 
 void WMenuPopupController::__winResizeCb(void *data, Evas *, Evas_Object *, void *)

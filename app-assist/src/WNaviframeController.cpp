@@ -10,12 +10,13 @@
 namespace app_assist
 {
 
-WNaviframeController::WNaviframeController() : __topCheckJob(nullptr), __popCbRan(false)
-{
-}
+WNaviframeController::WNaviframeController() : __topCheckJob(nullptr), __popCbRan(false) {}
 
 WNaviframeController::~WNaviframeController()
 {
+	for (WContentViewController *view : __pages)
+		view->__naviframe = nullptr;
+	__pages.clear();
 	if (__topCheckJob)
 		ecore_job_del(__topCheckJob);
 	__topCheckJob = nullptr;
@@ -47,15 +48,9 @@ void WNaviframeController::onDestroy()
 		ecore_job_del(__topCheckJob);
 	__topCheckJob = nullptr;
 	// The pages go after this controller: cut their way back to it.
-	Eina_List *items = elm_naviframe_items_get(getEvasObj());
-	void *item;
-	EINA_LIST_FREE(items, item)
-	{
-		WContentViewController *view =
-			static_cast<WContentViewController *>(elm_object_item_data_get(static_cast<Elm_Object_Item *>(item)));
-		if (view && view->__naviframe == this)
-			view->__naviframe = nullptr;
-	}
+	for (WContentViewController *view : __pages)
+		view->__naviframe = nullptr;
+	__pages.clear();
 }
 
 bool WNaviframeController::push(WContentViewController *view, const char *viewName, void *viewParam)
@@ -93,10 +88,11 @@ bool WNaviframeController::push(WContentViewController *view, const char *viewNa
 		return false;
 	}
 	view->__naviItem = item;
+	__pages.push_back(view);
 	elm_object_item_data_set(item, view);
 	elm_naviframe_item_pop_cb_set(item, __itemPopCb, view);
 	evas_object_event_callback_priority_add(view->getEvasObj(), EVAS_CALLBACK_DEL, EVAS_CALLBACK_PRIORITY_BEFORE,
-											WContentViewController::__pageDelCb, view);
+	                                        WContentViewController::__pageDelCb, view);
 	if (prevTop) {
 		WContentViewController *prev = static_cast<WContentViewController *>(elm_object_item_data_get(prevTop));
 		if (prev)
@@ -167,7 +163,7 @@ void WNaviframeController::__transitionFinishedCb(void *, Evas_Object *obj, void
 	EINA_LIST_FREE(items, item)
 	{
 		WContentViewController *view =
-			static_cast<WContentViewController *>(elm_object_item_data_get(static_cast<Elm_Object_Item *>(item)));
+		    static_cast<WContentViewController *>(elm_object_item_data_get(static_cast<Elm_Object_Item *>(item)));
 		if (!pending && view && view->__popPending)
 			pending = view;
 	}
@@ -205,8 +201,14 @@ Eina_Bool WNaviframeController::__itemPopCb(void *data, Elm_Object_Item *item)
 	return EINA_TRUE;
 }
 
-void WNaviframeController::__onPageLeft(WContentViewController *)
+void WNaviframeController::__onPageLeft(WContentViewController *view)
 {
+	for (auto it = __pages.begin(); it != __pages.end(); ++it) {
+		if (*it == view) {
+			__pages.erase(it);
+			break;
+		}
+	}
 	__scheduleTopCheck();
 }
 

@@ -7,8 +7,8 @@ namespace app_assist
 {
 
 WUiTimer::WUiTimer(std::function<bool(void *)> func, void *data, Evas_Object *ownerObj)
-	: __func(std::move(func)), __data(data), __owner(ownerObj), __timer(nullptr), __idler(nullptr), __running(false),
-	  __ended(false)
+    : __func(std::move(func)), __data(data), __owner(ownerObj), __timer(nullptr), __idler(nullptr), __running(false),
+      __ended(false)
 {
 	__selfPtr = std::shared_ptr<WUiTimer>(this, [](WUiTimer *) {});
 	if (__owner)
@@ -27,7 +27,7 @@ WUiTimer::~WUiTimer()
 }
 
 WUiTimerHandle WUiTimer::addTimer(double seconds, std::function<bool(void *)> timerFunc, void *data,
-								  Evas_Object *ownerObj)
+                                  Evas_Object *ownerObj)
 {
 	if (!timerFunc) {
 		WERROR("timerFunc is empty");

@@ -63,13 +63,9 @@ bool WViewController::canDestroy() const
 	return true;
 }
 
-void WViewController::onCreated()
-{
-}
+void WViewController::onCreated() {}
 
-void WViewController::onDestroy()
-{
-}
+void WViewController::onDestroy() {}
 
 Evas_Object *WViewController::getEvasObj() const
 {

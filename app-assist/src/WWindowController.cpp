@@ -37,7 +37,7 @@ static void __initialSize(int *w, int *h)
 }
 
 WWindowController::WWindowController(const char *name, Elm_Win_Type winType)
-	: __name(name ? name : ""), __win(nullptr), __conformant(nullptr), __baseLayout(nullptr), __baseView(nullptr)
+    : __name(name ? name : ""), __win(nullptr), __conformant(nullptr), __baseLayout(nullptr), __baseView(nullptr)
 {
 	__win = elm_win_add(nullptr, __name.c_str(), winType);
 	if (!__win) {

@@ -50,9 +50,9 @@ public:
 	MemoDocInfo *getOneMemoN(const char *uuid);
 	// New lists of live memos in display order; the caller deletes the list (and so its records).
 	MemoItemList *getVisibleNormalMemoListN(); // not hidden, not quick
-	MemoItemList *getVisibleMemoListN();	   // not hidden; the quick memo first
-	MemoItemList *getAllNormalMemoListN();	   // hidden too, not quick; colours not read
-	MemoItemList *getAllMemoListN();		   // everything live; colours not read
+	MemoItemList *getVisibleMemoListN();       // not hidden; the quick memo first
+	MemoItemList *getAllNormalMemoListN();     // hidden too, not quick; colours not read
+	MemoItemList *getAllMemoListN();           // everything live; colours not read
 	// True if the memo's isHidden is non-zero.
 	bool isMemoHidden(const char *uuid);
 	// Copies the memo's thumbnail path into *path (caller frees) when it is longer than 1 byte.
@@ -110,6 +110,7 @@ private:
 	MemoDbMgr &operator=(const MemoDbMgr &) = delete;
 
 	bool construct();
+	void __tuneConnection();
 	void __createSchema();
 	bool __createQuickMemo();
 	// Prepared statement of the formatted text, or null (logged); the caller finalises it.

@@ -24,7 +24,7 @@ public:
 
 	// Stores the UUID; returns false in every case (no caller reads it).
 	bool setMemoUUID(const char *uuid);
-	bool setIsDirty(int isDirty);	  // refuses anything but 0 and 1
+	bool setIsDirty(int isDirty);     // refuses anything but 0 and 1
 	bool setIsDeleted(int isDeleted); // refuses anything but 0 and 1
 	bool setAccountType(const char *accountType);
 	bool setAccountName(const char *accountName);

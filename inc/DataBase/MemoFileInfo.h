@@ -14,7 +14,7 @@ public:
 	virtual ~MemoFileInfo();
 
 	bool setFileUUID(const char *uuid);
-	bool setIsDirty(int isDirty);	  // refuses anything but 0 and 1
+	bool setIsDirty(int isDirty);     // refuses anything but 0 and 1
 	bool setIsDeleted(int isDeleted); // refuses anything but 0 and 1
 	bool setAccountType(const char *accountType);
 	bool setAccountName(const char *accountName);

@@ -43,8 +43,8 @@ int preference_is_existing(const char *key, bool *existing);
 int preference_foreach_item(preference_item_cb callback, void *user_data);
 
 /* One callback per key (a second call replaces it), called on the Ecore main loop whenever this or any
-   other process of the package sets or removes the key, even to the same value.
-   PREFERENCE_ERROR_NO_KEY if the key does not exist yet. */
+   other process of the package sets the key, even to the same value. Removing the key calls nothing;
+   the callback stays for when it is set again. PREFERENCE_ERROR_NO_KEY if the key does not exist yet. */
 int preference_set_changed_cb(const char *key, preference_changed_cb callback, void *user_data);
 int preference_unset_changed_cb(const char *key);
 

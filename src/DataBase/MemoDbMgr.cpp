@@ -19,29 +19,32 @@
 // A writer waits at most this many retries of this many milliseconds for the other side.
 #define MEMO_DB_BUSY_RETRY_LIMIT 100
 #define MEMO_DB_BUSY_SLEEP_MS 100
+// Page cache (KiB) and memory map (bytes) of the connection.
+#define MEMO_DB_CACHE_KIB "32768"
+#define MEMO_DB_MMAP_BYTES "268435456"
 
 // The schema as the sync service knows it, typos included: both sides must agree on it.
 static const char *const gSchema[] = {
-	"CREATE TABLE memo(_id\tINTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,isDirty INTEGER NOT NULL "
-	"DEFAULT 0,isDeleted\tINTEGER NOT NULL DEFAULT 0,\taccountType TEXT,\taccountName TEXT DEFAULT '', sync1 "
-	"INTEGER,sync2 TEXT,isNeedUpsync\tINTEGER NOT NULL DEFAULT 0,\tcreatedAt INTEGER NOT NULL,\tlastModifiedAt "
-	"INTEGER NOT NULL,\tcategoryUUID\tTEXT NOT NULL DEFAULT '',title TEXT NOT NULL DEFAULT '',content TEXT NOT NULL "
-	"DEFAULT '',tizenXmlContent TEXT NOT NULL DEFAULT '',xmlContent TEXT DEFAULT '',display_Content TEXT NOT NULL "
-	"DEFAULT '',vrfileUUID TEXT NOT NULL DEFAULT '',strippedContent TEXT NOT NULL DEFAULT '',_data TEXT NOT NULL "
-	"DEFAULT '',_phoneNum TEXT,isFavorite INTERGER NOT NULL DEFAULT 0,isHidden INTERGER DEFAULT 0,isQuick INTERGER "
-	"DEFAULT 0,isSynced INTERGER DEFAULT 0,bgColor TEXT NOT NULL DEFAULT '');",
-	"CREATE TABLE category (_id INTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,\tisDirty INTEGER NOT "
-	"NULL DEFAULT 0,isDeleted INTEGERNOT NULL DEFAULT 0,accountType TEXT,accountName TEXT DEFAULT '',\tsync1 "
-	"INTEGER,\tsync2 TEXT,\tisNeedUpsync INTEGER NOT NULL DEFAULT 0, orderBy INTEGER NOT NULL DEFAULT "
-	"999999,_display_name TEXT NOT NULL);",
-	"CREATE TABLE file (_id INTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,isDirty INTEGER NOT NULL "
-	"DEFAULT 0,isDeleted INTEGER NOT NULL DEFAULT 0,accountType TEXT,accountName TEXT DEFAULT '',sync1 INTEGER,sync2 "
-	"TEXT,isNeedUpsync INTEGER NOT NULL DEFAULT 0,memoUUID TEXT NOT NULL DEFAULT '',mime_type TEXT NOT NULL DEFAULT "
-	"'application/octet-stream',\t_display_name TEXT NOT NULL DEFAULT '',\t_size INTEGER NOT NULL DEFAULT "
-	"0,\torientation INTEGER NOT NULL DEFAULT 0,\tpath TEXT NOT NULL, _data TEXT NOT NULL);",
-	"CREATE TABLE android_metadata (locale TEXT);",
-	"CREATE TABLE password (hiddenPass TEXT);",
-	"CREATE TRIGGER delete_file DELETE ON memo BEGIN DELETE FROM file WHERE memoUUID = old.UUID; END;",
+    "CREATE TABLE memo(_id\tINTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,isDirty INTEGER NOT NULL "
+    "DEFAULT 0,isDeleted\tINTEGER NOT NULL DEFAULT 0,\taccountType TEXT,\taccountName TEXT DEFAULT '', sync1 "
+    "INTEGER,sync2 TEXT,isNeedUpsync\tINTEGER NOT NULL DEFAULT 0,\tcreatedAt INTEGER NOT NULL,\tlastModifiedAt "
+    "INTEGER NOT NULL,\tcategoryUUID\tTEXT NOT NULL DEFAULT '',title TEXT NOT NULL DEFAULT '',content TEXT NOT NULL "
+    "DEFAULT '',tizenXmlContent TEXT NOT NULL DEFAULT '',xmlContent TEXT DEFAULT '',display_Content TEXT NOT NULL "
+    "DEFAULT '',vrfileUUID TEXT NOT NULL DEFAULT '',strippedContent TEXT NOT NULL DEFAULT '',_data TEXT NOT NULL "
+    "DEFAULT '',_phoneNum TEXT,isFavorite INTERGER NOT NULL DEFAULT 0,isHidden INTERGER DEFAULT 0,isQuick INTERGER "
+    "DEFAULT 0,isSynced INTERGER DEFAULT 0,bgColor TEXT NOT NULL DEFAULT '');",
+    "CREATE TABLE category (_id INTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,\tisDirty INTEGER NOT "
+    "NULL DEFAULT 0,isDeleted INTEGERNOT NULL DEFAULT 0,accountType TEXT,accountName TEXT DEFAULT '',\tsync1 "
+    "INTEGER,\tsync2 TEXT,\tisNeedUpsync INTEGER NOT NULL DEFAULT 0, orderBy INTEGER NOT NULL DEFAULT "
+    "999999,_display_name TEXT NOT NULL);",
+    "CREATE TABLE file (_id INTEGER PRIMARY KEY AUTOINCREMENT,UUID TEXT NOT NULL UNIQUE,isDirty INTEGER NOT NULL "
+    "DEFAULT 0,isDeleted INTEGER NOT NULL DEFAULT 0,accountType TEXT,accountName TEXT DEFAULT '',sync1 INTEGER,sync2 "
+    "TEXT,isNeedUpsync INTEGER NOT NULL DEFAULT 0,memoUUID TEXT NOT NULL DEFAULT '',mime_type TEXT NOT NULL DEFAULT "
+    "'application/octet-stream',\t_display_name TEXT NOT NULL DEFAULT '',\t_size INTEGER NOT NULL DEFAULT "
+    "0,\torientation INTEGER NOT NULL DEFAULT 0,\tpath TEXT NOT NULL, _data TEXT NOT NULL);",
+    "CREATE TABLE android_metadata (locale TEXT);",
+    "CREATE TABLE password (hiddenPass TEXT);",
+    "CREATE TRIGGER delete_file DELETE ON memo BEGIN DELETE FROM file WHERE memoUUID = old.UUID; END;",
 };
 
 sqlite3 *MemoDbMgr::__handle = nullptr;
@@ -101,9 +104,20 @@ bool MemoDbMgr::construct()
 		__handle = nullptr;
 		return true;
 	}
+	__tuneConnection();
 	if (!exists)
 		__createSchema();
 	return true;
+}
+
+void MemoDbMgr::__tuneConnection()
+{
+	// The list reads sort every visible memo with all its body columns (several KB each): keep
+	// that sort and the pages it reads in memory instead of spilling to temporary files.
+	// Connection settings only; the file and its schema are untouched.
+	sqlite3_exec(__handle, "PRAGMA temp_store = MEMORY", nullptr, nullptr, nullptr);
+	sqlite3_exec(__handle, "PRAGMA cache_size = -" MEMO_DB_CACHE_KIB, nullptr, nullptr, nullptr);
+	sqlite3_exec(__handle, "PRAGMA mmap_size = " MEMO_DB_MMAP_BYTES, nullptr, nullptr, nullptr);
 }
 
 void MemoDbMgr::__createSchema()

@@ -23,15 +23,15 @@
 #define MEMO_EMPTY_TODOLIST "<todolist></todolist>"
 
 // isDirty is named twice; SQLite takes the first value, so the row starts clean.
-#define MEMO_SQL_INSERT_QUICK_MEMO                                                                                    \
-	"INSERT INTO memo(UUID,isDirty,isDeleted,createdAt,lastModifiedAt,title,content,tizenXmlContent,xmlContent,"      \
-	"display_Content,strippedContent,isFavorite,isHidden,isQuick,isDirty,bgColor)VALUES('%q',%d,%d,%llu, %llu, "     \
+#define MEMO_SQL_INSERT_QUICK_MEMO                                                                                     \
+	"INSERT INTO memo(UUID,isDirty,isDeleted,createdAt,lastModifiedAt,title,content,tizenXmlContent,xmlContent,"       \
+	"display_Content,strippedContent,isFavorite,isHidden,isQuick,isDirty,bgColor)VALUES('%q',%d,%d,%llu, %llu, "       \
 	"'%q', '%q','%q','%q','%q','%q',%d,%d,%d,%d,'%q')"
-#define MEMO_SQL_UPDATE_QUICK_TEXT                                                                                    \
-	"UPDATE memo SET xmlContent='%q', tizenXmlContent='%q', content = '%q',strippedContent = '%q', display_Content " \
+#define MEMO_SQL_UPDATE_QUICK_TEXT                                                                                     \
+	"UPDATE memo SET xmlContent='%q', tizenXmlContent='%q', content = '%q',strippedContent = '%q', display_Content "   \
 	"= '%q', lastModifiedAt = %llu, isDirty = %d WHERE UUID = '%q'"
-#define MEMO_SQL_INIT_QUICK_MEMO                                                                                      \
-	"UPDATE memo SET isDirty=1, lastModifiedAt=%llu, content='%q', display_Content='%q', strippedContent='%q', "      \
+#define MEMO_SQL_INIT_QUICK_MEMO                                                                                       \
+	"UPDATE memo SET isDirty=1, lastModifiedAt=%llu, content='%q', display_Content='%q', strippedContent='%q', "       \
 	"xmlContent='%q', tizenXmlContent='%q', _data='%q' WHERE _id=1"
 
 bool MemoDbMgr::__createQuickMemo()
@@ -52,8 +52,8 @@ bool MemoDbMgr::__createQuickMemo()
 	}
 
 	unsigned long long now = memoDbTimeStamp();
-	int ret = excuteSql(MEMO_SQL_INSERT_QUICK_MEMO, uuid, 0, 0, now, now, title ? title : "", "", "", "", "", "", 0,
-						0, 1, 1, MEMO_QUICK_MEMO_BG_COLOR);
+	int ret = excuteSql(MEMO_SQL_INSERT_QUICK_MEMO, uuid, 0, 0, now, now, title ? title : "", "", "", "", "", "", 0, 0,
+	                    1, 1, MEMO_QUICK_MEMO_BG_COLOR);
 	free(uuid);
 	if (ret != SQLITE_OK) {
 		MEMO_LOGE("ERROR(%d).", ret);
@@ -86,7 +86,8 @@ bool MemoDbMgr::addQuickMemo(const char *text)
 
 	std::unique_ptr<MemoDocInfo> info(new MemoDocInfo());
 	{
-		MemoSqlStmt stmt(__createSqliteStmt("SELECT UUID, tizenXmlContent FROM memo WHERE isDeleted = 0 AND isQuick = 1 "));
+		MemoSqlStmt stmt(
+		    __createSqliteStmt("SELECT UUID, tizenXmlContent FROM memo WHERE isDeleted = 0 AND isQuick = 1 "));
 		if (stmt && stmt.step() == SQLITE_ROW) {
 			info->setMemoUUID(stmt.text(0));
 			info->setTizenXmlContent(stmt.text(1));
@@ -94,8 +95,9 @@ bool MemoDbMgr::addQuickMemo(const char *text)
 	}
 
 	// The text becomes the last unchecked item; it goes in unescaped, as the converter expects.
-	std::string item = std::string("<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"") +
-					   text + "\"/></todolist>";
+	std::string item =
+	    std::string("<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"") + text +
+	    "\"/></todolist>";
 	std::string document = info->getTizenXmlContent();
 	if (document.empty()) {
 		MEMO_LOGE("Quick Memo is Empty");
@@ -118,9 +120,8 @@ bool MemoDbMgr::addQuickMemo(const char *text)
 	info->setLastModifiedAt(memoDbTimeStamp());
 
 	// Nothing to tell the caller if this fails: the launch request is answered either way.
-	excuteSql(MEMO_SQL_UPDATE_QUICK_TEXT, info->getAndroidXmlContent(), info->getTizenXmlContent(),
-			  info->getContent(), info->getStrippedContent(), info->getDisplayContent(), info->getLastModifiedAt(), 1,
-			  info->getMemoUUID());
+	excuteSql(MEMO_SQL_UPDATE_QUICK_TEXT, info->getAndroidXmlContent(), info->getTizenXmlContent(), info->getContent(),
+	          info->getStrippedContent(), info->getDisplayContent(), info->getLastModifiedAt(), 1, info->getMemoUUID());
 	return true;
 }
 

@@ -13,45 +13,48 @@
 #include "MemoLog.h"
 #include "MemoSqlStmt.h"
 
-#define MEMO_SQL_ONE_MEMO                                                                                             \
+#define MEMO_SQL_ONE_MEMO                                                                                              \
 	"SELECT "                                                                                                          \
-	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID," \
-	"title,content,xmlContent, tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite, " \
+	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID,"   \
+	"title,content,xmlContent, "                                                                                       \
+	"tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite, "                          \
 	"isQuick,bgColor FROM memo WHERE UUID = '%q'"
-#define MEMO_SQL_VISIBLE_NORMAL_LIST                                                                                  \
+#define MEMO_SQL_VISIBLE_NORMAL_LIST                                                                                   \
 	"SELECT "                                                                                                          \
-	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID," \
-	"title,content,xmlContent, tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite, " \
-	"isQuick, bgColor FROM memo WHERE isDeleted = 0 AND isHidden = 0 AND isQuick = 0 ORDER BY isFavorite DESC, "      \
+	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID,"   \
+	"title,content,xmlContent, "                                                                                       \
+	"tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite, "                          \
+	"isQuick, bgColor FROM memo WHERE isDeleted = 0 AND isHidden = 0 AND isQuick = 0 ORDER BY isFavorite DESC, "       \
 	"lastModifiedAt DESC"
-#define MEMO_SQL_VISIBLE_LIST                                                                                         \
+#define MEMO_SQL_VISIBLE_LIST                                                                                          \
 	"SELECT "                                                                                                          \
-	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID," \
-	"title,content,xmlContent, tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite, " \
-	"isQuick, bgColor FROM memo WHERE isDeleted = 0 AND isHidden = 0 ORDER BY isQuick DESC, isFavorite DESC, "        \
+	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID,"   \
+	"title,content,xmlContent, "                                                                                       \
+	"tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite, "                          \
+	"isQuick, bgColor FROM memo WHERE isDeleted = 0 AND isHidden = 0 ORDER BY isQuick DESC, isFavorite DESC, "         \
 	"lastModifiedAt DESC"
-#define MEMO_SQL_ALL_NORMAL_LIST                                                                                      \
+#define MEMO_SQL_ALL_NORMAL_LIST                                                                                       \
 	"SELECT "                                                                                                          \
-	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID," \
-	"title,content,xmlContent,tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite," \
+	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID,"   \
+	"title,content,xmlContent,tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite,"  \
 	"isHidden , isQuick FROM memo WHERE isDeleted = 0 AND isQuick = 0 ORDER BY isFavorite DESC, lastModifiedAt DESC"
-#define MEMO_SQL_ALL_LIST                                                                                             \
+#define MEMO_SQL_ALL_LIST                                                                                              \
 	"SELECT "                                                                                                          \
-	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID," \
-	"title,content,xmlContent,tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite," \
+	"UUID,isDirty,isDeleted,accountType,accountName,sync1,sync2,isNeedUpsync,createdAt,lastModifiedAt,categoryUUID,"   \
+	"title,content,xmlContent,tizenXmlContent,display_Content,vrfileUUID,strippedContent,_data,_phoneNum,isFavorite,"  \
 	"isHidden, isQuick  FROM memo WHERE isDeleted = 0 ORDER BY isQuick DESC, isFavorite DESC, lastModifiedAt DESC"
 
-#define MEMO_SQL_SEARCH_COUNT_WITH_QUICK                                                                              \
-	"SELECT count(UUID) FROM memo WHERE (title like '%%%q%%' escape '/') OR (strippedContent like '%%%q%%' escape "   \
+#define MEMO_SQL_SEARCH_COUNT_WITH_QUICK                                                                               \
+	"SELECT count(UUID) FROM memo WHERE (title like '%%%q%%' escape '/') OR (strippedContent like '%%%q%%' escape "    \
 	"'/') OR isQuick=1 ORDER BY isQuick, isFavorite DESC"
-#define MEMO_SQL_SEARCH_COUNT                                                                                         \
-	"SELECT count(UUID) FROM memo WHERE ((title like '%%%q%%' escape '/') AND isQuick != 1) OR (strippedContent "     \
+#define MEMO_SQL_SEARCH_COUNT                                                                                          \
+	"SELECT count(UUID) FROM memo WHERE ((title like '%%%q%%' escape '/') AND isQuick != 1) OR (strippedContent "      \
 	"like '%%%q%%' escape '/') ORDER BY isFavorite DESC"
-#define MEMO_SQL_SEARCH_WITH_QUICK                                                                                    \
-	"SELECT distinct(UUID) FROM memo WHERE (title like '%%%q%%' escape '/') OR (strippedContent like '%%%q%%' "       \
+#define MEMO_SQL_SEARCH_WITH_QUICK                                                                                     \
+	"SELECT distinct(UUID) FROM memo WHERE (title like '%%%q%%' escape '/') OR (strippedContent like '%%%q%%' "        \
 	"escape '/') OR isQuick=1 ORDER BY isQuick DESC, isFavorite DESC, lastModifiedAt DESC"
-#define MEMO_SQL_SEARCH                                                                                               \
-	"SELECT distinct(UUID) FROM memo WHERE ((title like '%%%q%%' escape '/') AND isQuick != 1) OR (strippedContent "  \
+#define MEMO_SQL_SEARCH                                                                                                \
+	"SELECT distinct(UUID) FROM memo WHERE ((title like '%%%q%%' escape '/') AND isQuick != 1) OR (strippedContent "   \
 	"like '%%%q%%' escape '/') ORDER BY isFavorite DESC, lastModifiedAt DESC"
 
 // Fills a record from a row of one of the memo reads. The reads that select bgColor hold
@@ -108,7 +111,10 @@ int MemoDbMgr::__getCount(const char *sql)
 	return stmt.integer(0);
 }
 
-int MemoDbMgr::getMemoCount() { return __getCount("SELECT count(*) FROM memo WHERE isDeleted = 0"); }
+int MemoDbMgr::getMemoCount()
+{
+	return __getCount("SELECT count(*) FROM memo WHERE isDeleted = 0");
+}
 
 int MemoDbMgr::getHiddenMemoCount()
 {
@@ -142,13 +148,25 @@ MemoItemList *MemoDbMgr::__getMemoListN(const char *sql, bool withColor)
 	return list;
 }
 
-MemoItemList *MemoDbMgr::getVisibleNormalMemoListN() { return __getMemoListN(MEMO_SQL_VISIBLE_NORMAL_LIST, true); }
+MemoItemList *MemoDbMgr::getVisibleNormalMemoListN()
+{
+	return __getMemoListN(MEMO_SQL_VISIBLE_NORMAL_LIST, true);
+}
 
-MemoItemList *MemoDbMgr::getVisibleMemoListN() { return __getMemoListN(MEMO_SQL_VISIBLE_LIST, true); }
+MemoItemList *MemoDbMgr::getVisibleMemoListN()
+{
+	return __getMemoListN(MEMO_SQL_VISIBLE_LIST, true);
+}
 
-MemoItemList *MemoDbMgr::getAllNormalMemoListN() { return __getMemoListN(MEMO_SQL_ALL_NORMAL_LIST, false); }
+MemoItemList *MemoDbMgr::getAllNormalMemoListN()
+{
+	return __getMemoListN(MEMO_SQL_ALL_NORMAL_LIST, false);
+}
 
-MemoItemList *MemoDbMgr::getAllMemoListN() { return __getMemoListN(MEMO_SQL_ALL_LIST, false); }
+MemoItemList *MemoDbMgr::getAllMemoListN()
+{
+	return __getMemoListN(MEMO_SQL_ALL_LIST, false);
+}
 
 bool MemoDbMgr::isMemoHidden(const char *uuid)
 {
@@ -244,14 +262,14 @@ bool MemoDbMgr::__getPathsN(const char *countSql, const char *listSql, const cha
 bool MemoDbMgr::getFilePathsN(const char *uuid, char ***paths, int *count)
 {
 	return __getPathsN("SELECT count(*) FROM file WHERE memoUUID = '%q'",
-					   "SELECT path FROM file WHERE memoUUID = '%q' ORDER BY _id", uuid, paths, count);
+	                   "SELECT path FROM file WHERE memoUUID = '%q' ORDER BY _id", uuid, paths, count);
 }
 
 bool MemoDbMgr::getImageFilePathsN(const char *uuid, char ***paths, int *count)
 {
 	return __getPathsN("SELECT count(*) FROM file WHERE memoUUID = '%q' AND mime_type Like '%%image%%' ",
-					   "SELECT path FROM file WHERE memoUUID = '%q' AND mime_type Like '%%image%%'ORDER BY _id", uuid,
-					   paths, count);
+	                   "SELECT path FROM file WHERE memoUUID = '%q' AND mime_type Like '%%image%%'ORDER BY _id", uuid,
+	                   paths, count);
 }
 
 // The quick memo's stored title is a translated header, so its words are matched here
@@ -272,7 +290,7 @@ bool MemoDbMgr::getSearchReultN(const char *text, char ***uuids, int *count)
 	int total = 0;
 	{
 		MemoSqlStmt stmt(
-			__createSqliteStmt(withQuick ? MEMO_SQL_SEARCH_COUNT_WITH_QUICK : MEMO_SQL_SEARCH_COUNT, text, text));
+		    __createSqliteStmt(withQuick ? MEMO_SQL_SEARCH_COUNT_WITH_QUICK : MEMO_SQL_SEARCH_COUNT, text, text));
 		int ret = stmt ? stmt.step() : SQLITE_ERROR;
 		if (ret != SQLITE_ROW) {
 			*count = 0;

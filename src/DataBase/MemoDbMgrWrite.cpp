@@ -18,39 +18,39 @@
 #include "MemoSqlStmt.h"
 #include "Util/MemoUtil.h"
 
-#define MEMO_SQL_INSERT_MEMO                                                                                          \
-	"INSERT INTO memo(xmlContent,tizenXmlContent, content, title,accountName,sync2,accountType,strippedContent,"      \
-	"display_Content,UUID, categoryUUID, vrfileUUID, _data, lastModifiedAt, isDirty, isDeleted, createdAt, sync1, "   \
-	"isFavorite, isHidden,isSynced,bgColor) "                                                                        \
+#define MEMO_SQL_INSERT_MEMO                                                                                           \
+	"INSERT INTO memo(xmlContent,tizenXmlContent, content, title,accountName,sync2,accountType,strippedContent,"       \
+	"display_Content,UUID, categoryUUID, vrfileUUID, _data, lastModifiedAt, isDirty, isDeleted, createdAt, sync1, "    \
+	"isFavorite, isHidden,isSynced,bgColor) "                                                                          \
 	"VALUES('%q','%q','%q','%q','%q','%q','%q','%q','%q','%q','%q','%q','%q',%llu,%d,%d, %llu,%llu,%d,%d,%d,'%q')"
-#define MEMO_SQL_INSERT_FILE                                                                                          \
-	"INSERT INTO file(UUID,accountType,accountName,sync2,memoUUID,mime_type,_display_name, "                          \
-	"_data,isDirty,isDeleted,sync1,isNeedUpsync,_size,orientation, path)VALUES('%q','%q','%q','%q','%q','%q','%q','%" \
+#define MEMO_SQL_INSERT_FILE                                                                                           \
+	"INSERT INTO file(UUID,accountType,accountName,sync2,memoUUID,mime_type,_display_name, "                           \
+	"_data,isDirty,isDeleted,sync1,isNeedUpsync,_size,orientation, path)VALUES('%q','%q','%q','%q','%q','%q','%q','%"  \
 	"q',%d, %d, %llu, %d, %lld, %d, '%q')"
 // The same insert as addMemo's, as addNewFile has always spelled it.
-#define MEMO_SQL_INSERT_NEW_FILE                                                                                      \
-	"INSERT INTO file(UUID,accountType,accountName,sync2,memoUUID,mime_type,_display_name, "                          \
-	"_data,isDirty,isDeleted,sync1,isNeedUpsync,_size,orientation, path)VALUES('%q','%q','%q','%q','%q','%q','%q','%" \
+#define MEMO_SQL_INSERT_NEW_FILE                                                                                       \
+	"INSERT INTO file(UUID,accountType,accountName,sync2,memoUUID,mime_type,_display_name, "                           \
+	"_data,isDirty,isDeleted,sync1,isNeedUpsync,_size,orientation, path)VALUES('%q','%q','%q','%q','%q','%q','%q','%"  \
 	"q',%d, %d, %llu, %d, %lld, %d, '%q' )"
-#define MEMO_SQL_UPDATE_MEMO                                                                                          \
-	"UPDATE memo SET xmlContent='%q', tizenXmlContent='%q', content = '%q', title = '%q', accountName = '%q', sync2 " \
-	"= '%q',accountType = '%q',strippedContent = '%q', display_Content = '%q',  vrfileUUID='%q', _data = '%q', "      \
-	"lastModifiedAt = %llu, isDirty = %d , isDeleted = %d,sync1 = %llu, isFavorite = %d, isSynced = 0 , bgColor = "  \
+#define MEMO_SQL_UPDATE_MEMO                                                                                           \
+	"UPDATE memo SET xmlContent='%q', tizenXmlContent='%q', content = '%q', title = '%q', accountName = '%q', sync2 "  \
+	"= '%q',accountType = '%q',strippedContent = '%q', display_Content = '%q',  vrfileUUID='%q', _data = '%q', "       \
+	"lastModifiedAt = %llu, isDirty = %d , isDeleted = %d,sync1 = %llu, isFavorite = %d, isSynced = 0 , bgColor = "    \
 	"'%q' WHERE UUID = '%q'"
 // The quick memo keeps its stored title; its category is written instead.
-#define MEMO_SQL_UPDATE_QUICK_MEMO                                                                                    \
-	"UPDATE memo SET xmlContent='%q', tizenXmlContent='%q', content = '%q',  accountName = '%q', sync2 = "            \
-	"'%q',accountType = '%q',strippedContent = '%q', display_Content = '%q', categoryUUID = '%q', vrfileUUID='%q', "  \
-	"_data = '%q', lastModifiedAt = %llu, isDirty = %d , isDeleted = %d,sync1 = %llu, isFavorite = %d, isSynced = "   \
+#define MEMO_SQL_UPDATE_QUICK_MEMO                                                                                     \
+	"UPDATE memo SET xmlContent='%q', tizenXmlContent='%q', content = '%q',  accountName = '%q', sync2 = "             \
+	"'%q',accountType = '%q',strippedContent = '%q', display_Content = '%q', categoryUUID = '%q', vrfileUUID='%q', "   \
+	"_data = '%q', lastModifiedAt = %llu, isDirty = %d , isDeleted = %d,sync1 = %llu, isFavorite = %d, isSynced = "    \
 	"0,bgColor = '%q' WHERE UUID = '%q'"
 
 // Runs the file insert for one attachment.
 static int __insertFile(MemoDbMgr *db, const char *sql, const MemoFileInfo &file)
 {
 	return db->excuteSql(sql, file.getFileUUID(), file.getAccountType(), file.getAccountName(), file.getSync2(),
-						 file.getMemoUUID(), file.getMimeType(), file.getDisplayName(), file.getData(),
-						 file.getIsDirty(), file.getIsDeleted(), file.getSync1(), file.getIsNeedUpsync(),
-						 file.getSize(), file.getOrientation(), file.getPath());
+	                     file.getMemoUUID(), file.getMimeType(), file.getDisplayName(), file.getData(),
+	                     file.getIsDirty(), file.getIsDeleted(), file.getSync1(), file.getIsNeedUpsync(),
+	                     file.getSize(), file.getOrientation(), file.getPath());
 }
 
 bool MemoDbMgr::addMemo(MemoDocInfo *info)
@@ -63,11 +63,11 @@ bool MemoDbMgr::addMemo(MemoDocInfo *info)
 	char *title = elm_entry_markup_to_utf8(info->getTitle());
 	const char *uuid = info->getMemoUUID();
 	int ret = excuteSql(MEMO_SQL_INSERT_MEMO, info->getAndroidXmlContent(), info->getTizenXmlContent(),
-						info->getContent(), title ? title : "", info->getAccountName(), info->getSync2(),
-						info->getAccountType(), info->getStrippedContent(), info->getDisplayContent(), uuid,
-						info->getCategoryUUID(), info->getVrfileUUID(), info->getData(), info->getLastModifiedAt(),
-						info->getIsDirty(), 0, info->getCreatedAt(), info->getSync1(), info->getIsFavorite(),
-						info->getIsHidden(), 0, info->getBgColor());
+	                    info->getContent(), title ? title : "", info->getAccountName(), info->getSync2(),
+	                    info->getAccountType(), info->getStrippedContent(), info->getDisplayContent(), uuid,
+	                    info->getCategoryUUID(), info->getVrfileUUID(), info->getData(), info->getLastModifiedAt(),
+	                    info->getIsDirty(), 0, info->getCreatedAt(), info->getSync1(), info->getIsFavorite(),
+	                    info->getIsHidden(), 0, info->getBgColor());
 	free(title);
 	if (ret != SQLITE_OK) {
 		MEMO_LOGE("ERROR(%d).", ret);
@@ -96,17 +96,17 @@ bool MemoDbMgr::updateMemo(MemoDocInfo *info)
 	if (info->getIsQuick() == 0) {
 		char *title = elm_entry_markup_to_utf8(info->getTitle());
 		ret = excuteSql(MEMO_SQL_UPDATE_MEMO, info->getAndroidXmlContent(), info->getTizenXmlContent(),
-						info->getContent(), title ? title : "", info->getAccountName(), info->getSync2(),
-						info->getAccountType(), info->getStrippedContent(), info->getDisplayContent(),
-						info->getVrfileUUID(), info->getData(), info->getLastModifiedAt(), info->getIsDirty(), 0,
-						info->getSync1(), info->getIsFavorite(), info->getBgColor(), info->getMemoUUID());
+		                info->getContent(), title ? title : "", info->getAccountName(), info->getSync2(),
+		                info->getAccountType(), info->getStrippedContent(), info->getDisplayContent(),
+		                info->getVrfileUUID(), info->getData(), info->getLastModifiedAt(), info->getIsDirty(), 0,
+		                info->getSync1(), info->getIsFavorite(), info->getBgColor(), info->getMemoUUID());
 		free(title);
 	} else {
 		ret = excuteSql(MEMO_SQL_UPDATE_QUICK_MEMO, info->getAndroidXmlContent(), info->getTizenXmlContent(),
-						info->getContent(), info->getAccountName(), info->getSync2(), info->getAccountType(),
-						info->getStrippedContent(), info->getDisplayContent(), info->getCategoryUUID(),
-						info->getVrfileUUID(), info->getData(), info->getLastModifiedAt(), info->getIsDirty(), 0,
-						info->getSync1(), info->getIsFavorite(), info->getBgColor(), info->getMemoUUID());
+		                info->getContent(), info->getAccountName(), info->getSync2(), info->getAccountType(),
+		                info->getStrippedContent(), info->getDisplayContent(), info->getCategoryUUID(),
+		                info->getVrfileUUID(), info->getData(), info->getLastModifiedAt(), info->getIsDirty(), 0,
+		                info->getSync1(), info->getIsFavorite(), info->getBgColor(), info->getMemoUUID());
 	}
 	if (ret != SQLITE_OK) {
 		MEMO_LOGE("ERROR(%d).", ret);
@@ -235,8 +235,8 @@ bool MemoDbMgr::setFavorite(const char *uuid, int isFavorite)
 		MEMO_LOGE("uuid is NULL");
 		return false;
 	}
-	int ret = excuteSql("UPDATE memo SET isFavorite = %d, isDirty = 1, isSynced = 0 WHERE UUID = '%q'", isFavorite,
-						uuid);
+	int ret =
+	    excuteSql("UPDATE memo SET isFavorite = %d, isDirty = 1, isSynced = 0 WHERE UUID = '%q'", isFavorite, uuid);
 	if (ret != SQLITE_OK) {
 		MEMO_LOGE("ERROR(%d).", ret);
 		return false;

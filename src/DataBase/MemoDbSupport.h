@@ -16,6 +16,9 @@ static inline unsigned long long memoDbTimeStamp()
 	return static_cast<unsigned long long>(now.tv_sec) * 1000ULL;
 }
 
-static inline void memoDbNotifyChange() { vconf_set_int(MEMO_DATA_CHANGE_KEY, 1); }
+static inline void memoDbNotifyChange()
+{
+	vconf_set_int(MEMO_DATA_CHANGE_KEY, 1);
+}
 
 #endif

@@ -7,9 +7,9 @@
 #include "Util/MemoUtil.h"
 
 MemoDocInfo::MemoDocInfo()
-	: __isDirty(1), __isDeleted(0), __sync1(0), __isNeedUpsync(1), __createdAt(1), __lastModifiedAt(1),
-	  __isFavorite(0), __isHidden(0), __isQuick(0), __fileCount(0), __bgRed(228), __bgGreen(235), __bgBlue(235),
-	  __bgAlpha(255), __bgColor(MEMO_DEFAULT_BG_COLOR), __changed(0)
+    : __isDirty(1), __isDeleted(0), __sync1(0), __isNeedUpsync(1), __createdAt(1), __lastModifiedAt(1), __isFavorite(0),
+      __isHidden(0), __isQuick(0), __fileCount(0), __bgRed(228), __bgGreen(235), __bgBlue(235), __bgAlpha(255),
+      __bgColor(MEMO_DEFAULT_BG_COLOR), __changed(0)
 {
 	(void)__changed;
 }
@@ -17,10 +17,13 @@ MemoDocInfo::MemoDocInfo()
 MemoDocInfo::~MemoDocInfo() {}
 
 // A flag column holds 0 or 1; a negative value fails the test too, as unsigned.
-static bool __isFlag(int value) { return static_cast<unsigned int>(value) <= 1; }
+static bool __isFlag(int value)
+{
+	return static_cast<unsigned int>(value) <= 1;
+}
 
 // Stores a string field, refusing null with the given line.
-#define MEMO_SET_STRING(field, value, message)                                                                        \
+#define MEMO_SET_STRING(field, value, message)                                                                         \
 	do {                                                                                                               \
 		if (!(value)) {                                                                                                \
 			MEMO_LOGE(message);                                                                                        \
@@ -76,7 +79,10 @@ bool MemoDocInfo::setSync1(unsigned long long sync1)
 	return true;
 }
 
-bool MemoDocInfo::setSync2(const char *sync2) { MEMO_SET_STRING(__sync2, sync2, "sync2 is NULL"); }
+bool MemoDocInfo::setSync2(const char *sync2)
+{
+	MEMO_SET_STRING(__sync2, sync2, "sync2 is NULL");
+}
 
 bool MemoDocInfo::setIsNeedUpsync(int isNeedUpsync)
 {
@@ -105,9 +111,15 @@ bool MemoDocInfo::setCategoryUUID(const char *categoryUUID)
 	MEMO_SET_STRING(__categoryUUID, categoryUUID, "categoryUUID is NULL");
 }
 
-bool MemoDocInfo::setTitle(const char *title) { MEMO_SET_STRING(__title, title, "title is NULL"); }
+bool MemoDocInfo::setTitle(const char *title)
+{
+	MEMO_SET_STRING(__title, title, "title is NULL");
+}
 
-bool MemoDocInfo::setContent(const char *content) { MEMO_SET_STRING(__content, content, "content is NULL"); }
+bool MemoDocInfo::setContent(const char *content)
+{
+	MEMO_SET_STRING(__content, content, "content is NULL");
+}
 
 bool MemoDocInfo::setTizenXmlContent(const char *tizenXmlContent)
 {
@@ -134,7 +146,10 @@ bool MemoDocInfo::setStrippedContent(const char *strippedContent)
 	MEMO_SET_STRING(__strippedContent, strippedContent, "strippedContent is NULL");
 }
 
-bool MemoDocInfo::setData(const char *data) { MEMO_SET_STRING(__data, data, "data is NULL"); }
+bool MemoDocInfo::setData(const char *data)
+{
+	MEMO_SET_STRING(__data, data, "data is NULL");
+}
 
 bool MemoDocInfo::setPhoneNum(const char *phoneNum)
 {
@@ -206,7 +221,7 @@ bool MemoDocInfo::setBgColorRgba(int red, int green, int blue, int alpha)
 	__bgBlue = blue;
 	__bgAlpha = alpha;
 	__bgColor = std::to_string(red) + ";" + std::to_string(green) + ";" + std::to_string(blue) + ";" +
-				std::to_string(alpha) + ";";
+	            std::to_string(alpha) + ";";
 	return true;
 }
 

@@ -7,15 +7,17 @@
 
 #include "MemoLog.h"
 
-MemoFileInfo::MemoFileInfo()
-	: __isDirty(0), __isDeleted(0), __sync1(0), __isNeedUpsync(0), __size(0), __orientation(0)
+MemoFileInfo::MemoFileInfo() : __isDirty(0), __isDeleted(0), __sync1(0), __isNeedUpsync(0), __size(0), __orientation(0)
 {
 }
 
 MemoFileInfo::~MemoFileInfo() {}
 
 // A flag column holds 0 or 1; a negative value fails the test too, as unsigned.
-static bool __isFlag(int value) { return static_cast<unsigned int>(value) <= 1; }
+static bool __isFlag(int value)
+{
+	return static_cast<unsigned int>(value) <= 1;
+}
 
 bool MemoFileInfo::setFileUUID(const char *uuid)
 {

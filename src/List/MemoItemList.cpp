@@ -5,7 +5,10 @@
 
 MemoItemList::MemoItemList() : __list(nullptr) {}
 
-MemoItemList::~MemoItemList() { __clearList(); }
+MemoItemList::~MemoItemList()
+{
+	__clearList();
+}
 
 void MemoItemList::appendItem(MemoDocInfo *item)
 {

@@ -3,13 +3,9 @@
 
 MemoBroadCaster *MemoBroadCaster::__instance = nullptr;
 
-MemoBroadCaster::MemoBroadCaster()
-{
-}
+MemoBroadCaster::MemoBroadCaster() {}
 
-MemoBroadCaster::~MemoBroadCaster()
-{
-}
+MemoBroadCaster::~MemoBroadCaster() {}
 
 MemoBroadCaster::Signal &MemoBroadCaster::getInstance()
 {

@@ -7,13 +7,9 @@ using app_assist::WViewController;
 
 MemoPopupMonitor *MemoPopupMonitor::__instance = nullptr;
 
-MemoPopupMonitor::MemoPopupMonitor() : __popup(nullptr)
-{
-}
+MemoPopupMonitor::MemoPopupMonitor() : __popup(nullptr) {}
 
-MemoPopupMonitor::~MemoPopupMonitor()
-{
-}
+MemoPopupMonitor::~MemoPopupMonitor() {}
 
 MemoPopupMonitor *MemoPopupMonitor::getInstance()
 {

@@ -187,6 +187,10 @@ Evas_Object *placeImage(Evas *evas, RenderJob *job, int *width, int *x, int *dra
 
 bool renderImage(RenderJob *job)
 {
+	if (job->width <= 0 || job->height <= 0) {
+		MEMO_LOGE("invalid size %d x %d", job->width, job->height);
+		return false;
+	}
 	Ecore_Evas *ee = ecore_evas_buffer_new(job->width, job->height);
 	if (!ee) {
 		MEMO_LOGE("ecore_evas_buffer_new failed");

@@ -67,8 +67,8 @@ TEST_F(NaviframeTest, PoppingThePageAboveMakesTheLowerOneTopAgain)
 	EXPECT_EQ(naviframe->getTopContentViewController(), b);
 	pressKey("Escape");
 	ASSERT_TRUE(waitFor([&] { return hasEntry("B:destructor") && hasEntry("A:onBecomeTop"); }));
-	EXPECT_EQ(entriesOf("B"), (Log{"constructor", "onCreateView", "onCreated", "onPushed", "onPop", "onDestroy",
-								   "destructor"}));
+	EXPECT_EQ(entriesOf("B"),
+	          (Log{"constructor", "onCreateView", "onCreated", "onPushed", "onPop", "onDestroy", "destructor"}));
 	EXPECT_EQ(entriesOf("A"), (Log{"constructor", "onCreateView", "onCreated", "onPushed", "onBecomeTop"}));
 	EXPECT_EQ(naviframe->getTopContentViewController(), a);
 
@@ -155,8 +155,8 @@ TEST_F(NaviframeTest, MoreKeyReachesTheTopPage)
 	LoggingPage *a = new LoggingPage("A", &log);
 	ASSERT_TRUE(naviframe->push(a));
 	int moreCalls = 0;
-	a->setMoreButton(a->getNaviItem(), [](void *data, Evas_Object *, void *) { ++*static_cast<int *>(data); },
-					 &moreCalls);
+	a->setMoreButton(
+	    a->getNaviItem(), [](void *data, Evas_Object *, void *) { ++*static_cast<int *>(data); }, &moreCalls);
 	pressKey("Menu");
 	EXPECT_EQ(moreCalls, 1);
 	EXPECT_EQ(naviframe->getTopContentViewController(), a);

@@ -16,10 +16,7 @@ namespace
 class WSignalTest : public aa_test::UiTest
 {
 protected:
-	Evas_Object *makeOwner()
-	{
-		return evas_object_rectangle_add(evas_object_evas_get(window->getEvasObj()));
-	}
+	Evas_Object *makeOwner() { return evas_object_rectangle_add(evas_object_evas_get(window->getEvasObj())); }
 	std::vector<std::string> heard;
 };
 

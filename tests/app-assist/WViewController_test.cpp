@@ -31,7 +31,7 @@ protected:
 	}
 	// A popup with the given buttons, attached to page.
 	WPopupController *attachPopup(LoggingPage *page, std::function<void(bool *)> first,
-								  std::function<void(bool *)> second = nullptr)
+	                              std::function<void(bool *)> second = nullptr)
 	{
 		WPopupController *popup = new WPopupController();
 		popup->setTextTranslatable("app-assist-test");
@@ -73,11 +73,12 @@ TEST_F(ViewControllerTest, PopupButtonClosesOnlyWhenItsFlagIsSet)
 {
 	LoggingPage *page = pushPage("A");
 	int cancelCalls = 0, okCalls = 0;
-	WPopupController *popup =
-		attachPopup(page, [&](bool *) { ++cancelCalls; }, [&](bool *close) {
-			++okCalls;
-			*close = true;
-		});
+	WPopupController *popup = attachPopup(
+	    page, [&](bool *) { ++cancelCalls; },
+	    [&](bool *close) {
+		    ++okCalls;
+		    *close = true;
+	    });
 	WViewControllerWeakPtr weak = popup->getWeakPtr();
 	ASSERT_NE(popup->getEvasObj(), nullptr);
 	EXPECT_EQ(page->getPopup(), popup);
@@ -156,9 +157,9 @@ TEST_F(ViewControllerTest, MenuItemMayReplaceTheMenuByAPopup)
 	page->attachPopup(menu);
 	WViewControllerWeakPtr weak = menu->getWeakPtr();
 	Elm_Object_Item *item =
-		static_cast<Elm_Object_Item *>(eina_list_data_get(elm_ctxpopup_items_get(menu->getEvasObj())));
+	    static_cast<Elm_Object_Item *>(eina_list_data_get(elm_ctxpopup_items_get(menu->getEvasObj())));
 	elm_ctxpopup_item_selected_set(item, EINA_TRUE);
-	EXPECT_TRUE(weak.expired());
+	ASSERT_TRUE(waitFor([&] { return weak.expired(); }));
 	ASSERT_NE(page->getPopup(), nullptr);
 	EXPECT_STREQ(page->getPopup()->getClassName(), "WPopupController");
 }
@@ -166,14 +167,16 @@ TEST_F(ViewControllerTest, MenuItemMayReplaceTheMenuByAPopup)
 TEST_F(ViewControllerTest, TimerRepeatsUntilFalseAndDiesWithItsOwner)
 {
 	int ticks = 0;
-	WUiTimer::addTimer(0.01, [&](void *data) { return ++*static_cast<int *>(data) < 3; }, &ticks);
+	WUiTimer::addTimer(
+	    0.01, [&](void *data) { return ++*static_cast<int *>(data) < 3; }, &ticks);
 	ASSERT_TRUE(waitFor([&] { return ticks == 3; }));
 	runFor(0.1);
 	EXPECT_EQ(ticks, 3);
 
 	LoggingPage *page = pushPage("A");
 	int ownedTicks = 0;
-	auto handle = WUiTimer::addTimer(0.01, [&](void *) { return ++ownedTicks > 0; }, nullptr, page->getEvasObj());
+	auto handle = WUiTimer::addTimer(
+	    0.01, [&](void *) { return ++ownedTicks > 0; }, nullptr, page->getEvasObj());
 	ASSERT_TRUE(waitFor([&] { return ownedTicks >= 1; }));
 	page->destroy();
 	EXPECT_TRUE(handle.expired());
@@ -187,12 +190,12 @@ TEST_F(ViewControllerTest, IdlerThatDeletesItsOwnerEndsCleanly)
 	LoggingPage *page = pushPage("A");
 	int runs = 0;
 	WUiTimer::addIdler(
-		[&](void *) {
-			++runs;
-			page->destroy();
-			return true;
-		},
-		nullptr, page->getEvasObj());
+	    [&](void *) {
+		    ++runs;
+		    page->destroy();
+		    return true;
+	    },
+	    nullptr, page->getEvasObj());
 	ASSERT_TRUE(waitFor([&] { return runs == 1; }));
 	runFor(0.1);
 	EXPECT_EQ(runs, 1);
@@ -201,7 +204,8 @@ TEST_F(ViewControllerTest, IdlerThatDeletesItsOwnerEndsCleanly)
 TEST_F(ViewControllerTest, DeletedTimerNeverRuns)
 {
 	int runs = 0;
-	auto handle = WUiTimer::addTimer(0.0, [&](void *) { return ++runs > 0; }, nullptr);
+	auto handle = WUiTimer::addTimer(
+	    0.0, [&](void *) { return ++runs > 0; }, nullptr);
 	WUiTimer::deleteTimer(handle);
 	EXPECT_TRUE(handle.expired());
 	runFor(0.05);

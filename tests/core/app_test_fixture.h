@@ -64,7 +64,10 @@ struct BusRecorder {
 	{
 		MemoBroadCaster::getInstance().addListener([this](const char *key, void *) { keys.push_back(key); });
 	}
-	bool waitForCount(size_t count) { return memo_test::pump(5.0, [&] { return keys.size() >= count; }); }
+	bool waitForCount(size_t count)
+	{
+		return memo_test::pump(5.0, [&] { return keys.size() >= count; });
+	}
 	size_t countOf(const std::string &key) const
 	{
 		size_t n = 0;

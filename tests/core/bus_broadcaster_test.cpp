@@ -41,7 +41,8 @@ protected:
 
 TEST_F(BroadCasterTest, deliversEveryKeyInOrderOfRegistration)
 {
-	MemoBroadCaster::getInstance().addListener([this](const char *key, void *) { heard.push_back(std::string("a:") + key); });
+	MemoBroadCaster::getInstance().addListener(
+	    [this](const char *key, void *) { heard.push_back(std::string("a:") + key); });
 	MemoBroadCaster::getInstance().addListener([this](const char *key, void *payload) {
 		EXPECT_EQ(payload, nullptr);
 		heard.push_back(std::string("b:") + key);
@@ -52,7 +53,7 @@ TEST_F(BroadCasterTest, deliversEveryKeyInOrderOfRegistration)
 	MemoBroadCaster::getInstance().emit("broadcast,memo,app,resume", nullptr);
 
 	EXPECT_EQ(heard, (std::vector<std::string>{"a:broadcast,memo,app,pause", "b:broadcast,memo,app,pause",
-											   "a:broadcast,memo,app,resume", "b:broadcast,memo,app,resume"}));
+	                                           "a:broadcast,memo,app,resume", "b:broadcast,memo,app,resume"}));
 }
 
 TEST_F(BroadCasterTest, listenerLeavesWithItsView)
@@ -82,7 +83,7 @@ TEST_F(BroadCasterTest, selfRemovalAndLateArrivalDuringDelivery)
 	bus.emit("broadcast,sync,restore", nullptr);
 
 	EXPECT_EQ(heard, (std::vector<std::string>{"self:broadcast,sync,idle", "other:broadcast,sync,idle",
-											   "other:broadcast,sync,restore", "late:broadcast,sync,restore"}));
+	                                           "other:broadcast,sync,restore", "late:broadcast,sync,restore"}));
 }
 
 TEST_F(BroadCasterTest, destroyDropsEveryListenerAndTheirOwnerCallbacks)

@@ -30,7 +30,7 @@ pid_t holdLock(int seconds)
 	std::string secs = std::to_string(seconds);
 	std::string path = dbPath();
 	char *argv[] = {const_cast<char *>(helper.c_str()), const_cast<char *>(path.c_str()),
-					const_cast<char *>(secs.c_str()), const_cast<char *>(ready.c_str()), nullptr};
+	                const_cast<char *>(secs.c_str()), const_cast<char *>(ready.c_str()), nullptr};
 	pid_t pid = -1;
 	if (posix_spawn(&pid, helper.c_str(), nullptr, nullptr, argv, environ) != 0)
 		return -1;

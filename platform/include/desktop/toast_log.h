@@ -8,7 +8,7 @@
 extern "C" {
 #endif
 
-/* Number of messages posted in this process since start or the last clear. */
+/* Number of messages posted in this process since start or the last clear (the newest 256 are kept). */
 int desktop_toast_log_count(void);
 
 /* The index-th posted message, oldest first; NULL out of range. The log owns it. */

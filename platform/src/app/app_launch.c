@@ -198,6 +198,10 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 		return launch_error(APP_CONTROL_ERROR_APP_NOT_FOUND, "no registered app takes the operation",
 				    app_control->operation);
 
+	/* A request without operation is a default launch, and says so from now on. */
+	if (!app_control->operation)
+		app_control_set_operation(app_control, APP_CONTROL_OPERATION_DEFAULT);
+
 	Ecore_Ipc_Server *server = NULL;
 	int ret = target_connect(app_id, &server);
 	bundle_raw *raw = NULL;

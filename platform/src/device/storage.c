@@ -62,9 +62,15 @@ static int __internal_size(struct statvfs *buf)
 
 /* Both names are exported: which one a caller links to depends on its _FILE_OFFSET_BITS. */
 #undef storage_get_internal_memory_size
-int storage_get_internal_memory_size(struct statvfs *buf) { return __internal_size(buf); }
+int storage_get_internal_memory_size(struct statvfs *buf)
+{
+	return __internal_size(buf);
+}
 
-int storage_get_internal_memory_size64(struct statvfs *buf) { return __internal_size(buf); }
+int storage_get_internal_memory_size64(struct statvfs *buf)
+{
+	return __internal_size(buf);
+}
 
 int storage_get_available_space(int storage_id, unsigned long long *bytes)
 {

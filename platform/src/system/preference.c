@@ -278,8 +278,10 @@ static void __sweepWatchers(void)
 
 static void __keyChangedCb(const char *key, dir_watch_event_e event, void *data)
 {
-	(void)event;
 	(void)data;
+	/* A removal is no value to report; the registration stays for when the key comes back. */
+	if (event != DIR_WATCH_CHANGED)
+		return;
 	__dispatchDepth++;
 	for (pref_watcher_t *w = __watchers; w; w = w->next)
 		if (!w->removed && !strcmp(w->key, key))

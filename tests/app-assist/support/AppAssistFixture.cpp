@@ -78,7 +78,7 @@ void UiTest::runFor(double seconds)
 }
 
 LoggingPage::LoggingPage(const std::string &tag, std::vector<std::string> *log, bool failCreate)
-	: __tag(tag), __log(log), __failCreate(failCreate)
+    : __tag(tag), __log(log), __failCreate(failCreate)
 {
 	__log->push_back(__tag + ":constructor");
 }

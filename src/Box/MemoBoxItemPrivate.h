@@ -1,0 +1,46 @@
+#ifndef SRC_BOX_MEMOBOXITEMPRIVATE_H
+#define SRC_BOX_MEMOBOXITEMPRIVATE_H
+
+// Shared between the MemoBoxItem*.cpp and MemoEntryFilter*.cpp files only.
+
+#include <string>
+
+#include <WUiTimer.h>
+
+#include "Box/MemoBoxItem.h"
+
+// Text domain of the editor's translatable texts.
+#define MEMO_SUB_DOMAIN "memo-sub"
+
+// Characters that all body items of a memo share; the title has its own 128.
+const int MEMO_BOX_BODY_CHAR_LIMIT = 4096;
+const int MEMO_BOX_TITLE_CHAR_LIMIT = 128;
+
+// A tap that moved further than this in x or y is a drag.
+const int MEMO_BOX_TAP_MOVE_LIMIT = 20;
+
+#define MEMO_BOX_TEXT_STYLE_NORMAL "DEFAULT='color=#000000ff'"
+#define MEMO_BOX_TEXT_STYLE_CHECKED "DEFAULT='strikethrough=on strikethrough_color=#00000050 color=#00000064'"
+
+#define MEMO_BOX_LINE_BREAK "<br/>"
+
+// One picture to shrink on a worker. The worker reads only its own copy of the parameters; `item` is
+// cleared by the item's destructor so that an end callback after it finds nobody to tell.
+struct MemoBoxItem::__ResizeJob {
+	MemoBoxItem *item;
+	std::string path;
+	int width;
+	int height;
+	float ratio;
+	bool insertsPendingText;
+	Ecore_Thread *thread;
+};
+
+// Replaces every occurrence of `from` in `text` by `to`.
+void memoBoxReplaceAll(std::string &text, const std::string &from, const std::string &to);
+
+// True when `text` starts / ends with `piece`.
+bool memoBoxStartsWith(const std::string &text, const std::string &piece);
+bool memoBoxEndsWith(const std::string &text, const std::string &piece);
+
+#endif
