@@ -24,7 +24,9 @@ public:
 	// an empty function object logs and returns an empty handle.
 	static WUiTimerHandle addTimer(double seconds, std::function<bool(void *)> timerFunc, void *data,
 	                               Evas_Object *ownerObj = nullptr);
-	// Runs idlerFunc each time the main loop is idle until it returns false.
+	// Runs idlerFunc once the main loop has handled the current events (and on each further pass while it
+	// returns true). An Ecore idle enterer rather than an idler, so that it also runs under
+	// ecore_main_loop_iterate(), which skips idlers.
 	static WUiTimerHandle addIdler(std::function<bool(void *)> idlerFunc, void *data, Evas_Object *ownerObj = nullptr);
 	// Ends the timer or idler of handle; nothing happens when it has ended already.
 	static void deleteTimer(const WUiTimerHandle &handle);
@@ -43,7 +45,7 @@ private:
 	void *__data;
 	Evas_Object *__owner;
 	Ecore_Timer *__timer;
-	Ecore_Idler *__idler;
+	Ecore_Idle_Enterer *__idler;
 	bool __running;
 	bool __ended;
 	std::shared_ptr<WUiTimer> __selfPtr;

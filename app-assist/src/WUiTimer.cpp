@@ -23,7 +23,7 @@ WUiTimer::~WUiTimer()
 	if (__timer)
 		ecore_timer_del(__timer);
 	if (__idler)
-		ecore_idler_del(__idler);
+		ecore_idle_enterer_del(__idler);
 }
 
 WUiTimerHandle WUiTimer::addTimer(double seconds, std::function<bool(void *)> timerFunc, void *data,
@@ -50,9 +50,9 @@ WUiTimerHandle WUiTimer::addIdler(std::function<bool(void *)> idlerFunc, void *d
 		return WUiTimerHandle();
 	}
 	WUiTimer *idler = new WUiTimer(std::move(idlerFunc), data, ownerObj);
-	idler->__idler = ecore_idler_add(__tickCb, idler);
+	idler->__idler = ecore_idle_enterer_add(__tickCb, idler);
 	if (!idler->__idler) {
-		WERROR("ecore_idler_add failed");
+		WERROR("ecore_idle_enterer_add failed");
 		delete idler;
 		return WUiTimerHandle();
 	}

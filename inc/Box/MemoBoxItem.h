@@ -119,10 +119,15 @@ private:
 
 	// Entry filter (MemoEntryFilter*.cpp).
 	static void __entryFilter(void *data, Evas_Object *entry, char **text);
+	void __adoptFixedSizeTags(std::string &text, std::vector<std::string> &queue);
+	void __adoptImageTags(std::string &text);
+	std::string __copyIntoMediaFolder(const std::string &path);
+	void __getDisplayWidth(int *width, int *defaultHeight);
 	struct __ResizeJob;
 	void __queueResizeWorkers(const std::vector<std::string> &paths);
-	__ResizeJob *__new__ResizeJob(bool insertsPendingText);
-	void __forget__ResizeJob(__ResizeJob *job);
+	__ResizeJob *__startResizeWorker(bool insertsPendingText);
+	void __forgetResizeJob(__ResizeJob *job);
+	void __detachResizeJobs();
 	static void __resizeWorkerCb(void *data, Ecore_Thread *thread);
 	static void __resizeWorkerEndCb(void *data, Ecore_Thread *thread);
 	static void __resizeWorkerCancelCb(void *data, Ecore_Thread *thread);

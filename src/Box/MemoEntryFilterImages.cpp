@@ -1,0 +1,260 @@
+// The image steps of the entry filter: pasted tags are fitted to this display and their files taken
+// into the memo's media folder; large pictures are shrunk on workers while the insertion waits.
+#include "Box/MemoBoxItem.h"
+
+#include <Ecore_File.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <cstring>
+
+#include "MemoBoxItemPrivate.h"
+#include "MemoEntryFilterTags.h"
+#include "MemoLog.h"
+#include "Util/MemoUtil.h"
+
+namespace
+{
+const char *const FIXED_SIZE_TAG = "<item absize=240x180";
+const char *const SIZED_TAG = "<item size=";
+
+std::string buildTag(int width, int height, const std::string &path)
+{
+	char tag[2048];
+	snprintf(tag, sizeof(tag), "<item size=%dx%d vsize=full href=file://%s></item>", width, height, path.c_str());
+	return tag;
+}
+
+bool isJpeg(const std::string &path)
+{
+	return eina_str_has_extension(path.c_str(), ".jpg") || eina_str_has_extension(path.c_str(), ".jpeg");
+}
+} // namespace
+
+std::string memoFilterTagPath(const std::string &tag)
+{
+	const size_t href = tag.find(MEMO_ITEM_HREF_FILE);
+	if (href == std::string::npos)
+		return "";
+	const size_t start = href + strlen(MEMO_ITEM_HREF_FILE);
+	const size_t end = tag.find_first_of(" >", start);
+	return tag.substr(start, end == std::string::npos ? std::string::npos : end - start);
+}
+
+void memoFilterTagSetPath(std::string &tag, const std::string &path)
+{
+	const size_t href = tag.find(MEMO_ITEM_HREF_FILE);
+	if (href == std::string::npos)
+		return;
+	const size_t start = href + strlen(MEMO_ITEM_HREF_FILE);
+	size_t end = tag.find_first_of(" >", start);
+	if (end == std::string::npos)
+		end = tag.size();
+	tag.replace(start, end - start, path);
+}
+
+bool memoFilterTagSize(const std::string &tag, int *width, int *height)
+{
+	const size_t at = tag.find("size=");
+	if (at == std::string::npos)
+		return false;
+	return sscanf(tag.c_str() + at, "size=%dx%d", width, height) == 2;
+}
+
+void memoFilterTagSetSize(std::string &tag, int width, int height)
+{
+	const size_t at = tag.find("size=");
+	if (at == std::string::npos)
+		return;
+	const size_t start = at + strlen("size=");
+	size_t end = tag.find_first_of(" >", start);
+	if (end == std::string::npos)
+		end = tag.size();
+	char size[64];
+	snprintf(size, sizeof(size), "%dx%d", width, height);
+	tag.replace(start, end - start, size);
+}
+
+void MemoBoxItem::__getDisplayWidth(int *width, int *defaultHeight)
+{
+	if (memoBoxItemIsCheck(__type))
+		__getImgSizeCheckType(width, defaultHeight);
+	else
+		__getImgSizeTextType(width, defaultHeight);
+}
+
+// A copy of the picture under a new name in <data>media/<uuid>/, keeping the extension; "" on failure.
+std::string MemoBoxItem::__copyIntoMediaFolder(const std::string &path)
+{
+	const std::string folder = std::string(MemoUtil::getDataPath()) + "media/" + __memoUuid + "/";
+	if (!ecore_file_is_dir(folder.c_str()) && !ecore_file_mkpath(folder.c_str())) {
+		MEMO_LOGE("Can not make %s", folder.c_str());
+		return "";
+	}
+	char *uuid = nullptr;
+	if (!MemoUtil::createUUIDN(&uuid))
+		return "";
+	const char *name = ecore_file_file_get(path.c_str());
+	const char *dot = name ? strrchr(name, '.') : nullptr;
+	std::string target = folder + uuid + (dot ? dot : "");
+	free(uuid);
+	if (!ecore_file_cp(path.c_str(), target.c_str())) {
+		MEMO_LOGE("Copy failed: %s", path.c_str());
+		return "";
+	}
+	return target;
+}
+
+// Step 8: tags of the fixed paste size get this display's size and a copy of their file.
+void MemoBoxItem::__adoptFixedSizeTags(std::string &text, std::vector<std::string> &queue)
+{
+	size_t pos = 0;
+	while ((pos = text.find(FIXED_SIZE_TAG, pos)) != std::string::npos) {
+		const size_t end = memoFilterTagEnd(text, pos);
+		const std::string path = memoFilterTagPath(text.substr(pos, end - pos));
+		if (path.empty() || !ecore_file_exists(path.c_str())) {
+			pos = end;
+			continue;
+		}
+		std::string target = __copyIntoMediaFolder(path);
+		if (target.empty())
+			target = path;
+		int width = 0, height = 0;
+		__getImgDisplaySize(target.c_str(), &width, &height);
+		const std::string tag = buildTag(width, height, target);
+		text.replace(pos, end - pos, tag);
+		pos += tag.size();
+
+		int resizeWidth = 0, resizeHeight = 0, error = 0;
+		if (MemoUtil::getInsertImageSize(target.c_str(), &resizeWidth, &resizeHeight, &error))
+			queue.push_back(target);
+	}
+}
+
+// Step 9: sized tags are fitted to this display; a file from elsewhere is copied in and, when it is
+// large, shrunk by one worker that the insertion does not wait for.
+void MemoBoxItem::__adoptImageTags(std::string &text)
+{
+	const std::string folder = std::string(MemoUtil::getDataPath()) + "media/" + __memoUuid + "/";
+	int displayWidth = 0, defaultHeight = 0;
+	__getDisplayWidth(&displayWidth, &defaultHeight);
+
+	size_t pos = 0;
+	while ((pos = text.find(SIZED_TAG, pos)) != std::string::npos) {
+		const size_t end = memoFilterTagEnd(text, pos);
+		std::string tag = text.substr(pos, end - pos);
+		std::string path = memoFilterTagPath(tag);
+
+		int width = 0, height = 0;
+		if (memoFilterTagSize(tag, &width, &height) && width != displayWidth) {
+			__getImgDisplaySize(path.c_str(), &width, &height);
+			memoFilterTagSetSize(tag, width, height);
+		}
+		if (!path.empty() && !memoBoxStartsWith(path, folder)) {
+			const std::string target = __copyIntoMediaFolder(path);
+			if (!target.empty()) {
+				memoFilterTagSetPath(tag, target);
+				int resizeWidth = 0, resizeHeight = 0, error = 0;
+				float ratio = 1.0f;
+				if (MemoUtil::getInsertImageSize(target.c_str(), &resizeWidth, &resizeHeight, &error, &ratio)) {
+					__resizePath = target;
+					__resizeWidth = resizeWidth;
+					__resizeHeight = resizeHeight;
+					__resizeRatio = ratio;
+					__startResizeWorker(false);
+				}
+			}
+		}
+		text.replace(pos, end - pos, tag);
+		pos += tag.size();
+	}
+}
+
+// Step 10 with a queue: the text waits in __pendingText until the last worker has ended.
+void MemoBoxItem::__queueResizeWorkers(const std::vector<std::string> &paths)
+{
+	if (__listener)
+		__listener->onImagePopupRequested(true);
+	// Counted before any worker starts, so that a worker that ends at once cannot find the count at 0.
+	__pendingThreads += static_cast<int>(paths.size());
+	for (const std::string &path : paths) {
+		int error = 0;
+		__resizePath = path;
+		MemoUtil::getInsertImageSize(path.c_str(), &__resizeWidth, &__resizeHeight, &error, &__resizeRatio);
+		__startResizeWorker(true);
+	}
+}
+
+MemoBoxItem::__ResizeJob *MemoBoxItem::__startResizeWorker(bool insertsPendingText)
+{
+	__ResizeJob *job =
+		new __ResizeJob{this, __resizePath, __resizeWidth, __resizeHeight, __resizeRatio, insertsPendingText, nullptr};
+	__jobs.push_back(job);
+	Ecore_Thread *thread = ecore_thread_run(__resizeWorkerCb, __resizeWorkerEndCb, __resizeWorkerCancelCb, job);
+	// A failed start has already run the cancel callback, which freed the job.
+	if (thread) {
+		job->thread = thread;
+		__threadHandle = thread;
+	}
+	return thread ? job : nullptr;
+}
+
+void MemoBoxItem::__forgetResizeJob(__ResizeJob *job)
+{
+	__jobs.erase(std::remove(__jobs.begin(), __jobs.end(), job), __jobs.end());
+	if (job->thread == __threadHandle)
+		__threadHandle = nullptr;
+}
+
+void MemoBoxItem::__detachResizeJobs()
+{
+	for (__ResizeJob *job : __jobs)
+		job->item = nullptr;
+	bool lastRunning = false;
+	for (__ResizeJob *job : __jobs)
+		lastRunning = lastRunning || (job->thread && job->thread == __threadHandle);
+	__jobs.clear();
+	if (lastRunning)
+		ecore_thread_cancel(__threadHandle);
+	__threadHandle = nullptr;
+}
+
+// Worker: touches only the job's file.
+void MemoBoxItem::__resizeWorkerCb(void *data, Ecore_Thread *thread)
+{
+	(void)thread;
+	__ResizeJob *job = static_cast<__ResizeJob *>(data);
+	if (isJpeg(job->path))
+		MemoUtil::resizeImageJpg(job->path.c_str(), job->path.c_str(), job->width, job->height, job->ratio);
+	else
+		MemoUtil::resizeImage(job->path.c_str(), job->path.c_str(), job->width, job->height, 2);
+}
+
+void MemoBoxItem::__resizeWorkerEndCb(void *data, Ecore_Thread *thread)
+{
+	(void)thread;
+	__ResizeJob *job = static_cast<__ResizeJob *>(data);
+	MemoBoxItem *self = job->item;
+	const bool insertsPendingText = job->insertsPendingText;
+	if (self)
+		self->__forgetResizeJob(job);
+	delete job;
+	if (!self || !insertsPendingText)
+		return;
+
+	if (--self->__pendingThreads > 0)
+		return;
+	self->__pendingThreads = 0;
+	if (self->__listener)
+		self->__listener->onImagePopupRequested(false);
+	const std::string text = self->__pendingText;
+	self->__pendingText.clear();
+	if (self->__entryObj)
+		elm_entry_entry_insert(self->__entryObj, text.c_str());
+}
+
+void MemoBoxItem::__resizeWorkerCancelCb(void *data, Ecore_Thread *thread)
+{
+	// A cancelled or failed worker ends the wait as well: the picture simply stays as large as it was.
+	__resizeWorkerEndCb(data, thread);
+}
