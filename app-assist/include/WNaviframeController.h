@@ -47,8 +47,9 @@ private:
 	static void __topCheckJobCb(void *data);
 	static void __transitionFinishedCb(void *data, Evas_Object *obj, void *eventInfo);
 	void __popTop(WContentViewController *view);
-	void __onPageLeft(WContentViewController *view);
+	void __onPageLeft(WContentViewController *view, Elm_Object_Item *item);
 	void __scheduleTopCheck();
+	void __detachPages();
 
 	std::function<void(bool *)> __lastItemPopCb;
 	// Every page that still points back here, those in a pop transition included.

@@ -21,7 +21,7 @@ WContentViewController::~WContentViewController()
 	if (getEvasObj())
 		evas_object_event_callback_del_full(getEvasObj(), EVAS_CALLBACK_DEL, __pageDelCb, this);
 	if (__naviframe)
-		__naviframe->__onPageLeft(this);
+		__naviframe->__onPageLeft(this, __naviItem);
 }
 
 void WContentViewController::onSetContainerProperties(WNaviframeController *, Evas_Object *) {}
@@ -107,11 +107,12 @@ void WContentViewController::__leaveNaviframe()
 		__popped = true;
 		onPop();
 	}
+	Elm_Object_Item *item = __naviItem;
 	__naviItem = nullptr;
 	WNaviframeController *naviframe = __naviframe;
 	__naviframe = nullptr;
 	if (naviframe)
-		naviframe->__onPageLeft(this);
+		naviframe->__onPageLeft(this, item);
 }
 
 } // namespace app_assist

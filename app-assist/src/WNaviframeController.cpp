@@ -14,12 +14,7 @@ WNaviframeController::WNaviframeController() : __topCheckJob(nullptr), __popCbRa
 
 WNaviframeController::~WNaviframeController()
 {
-	for (WContentViewController *view : __pages)
-		view->__naviframe = nullptr;
-	__pages.clear();
-	if (__topCheckJob)
-		ecore_job_del(__topCheckJob);
-	__topCheckJob = nullptr;
+	__detachPages();
 }
 
 const char *WNaviframeController::getClassName() const
@@ -44,10 +39,15 @@ Evas_Object *WNaviframeController::onCreateView(Evas_Object *parent, void *)
 
 void WNaviframeController::onDestroy()
 {
+	__detachPages();
+}
+
+// The pages go after this controller: cut their way back to it.
+void WNaviframeController::__detachPages()
+{
 	if (__topCheckJob)
 		ecore_job_del(__topCheckJob);
 	__topCheckJob = nullptr;
-	// The pages go after this controller: cut their way back to it.
 	for (WContentViewController *view : __pages)
 		view->__naviframe = nullptr;
 	__pages.clear();
@@ -177,7 +177,7 @@ void WNaviframeController::__transitionFinishedCb(void *, Evas_Object *obj, void
 Eina_Bool WNaviframeController::__itemPopCb(void *data, Elm_Object_Item *item)
 {
 	WContentViewController *view = static_cast<WContentViewController *>(data);
-	WNaviframeController *self = view->__naviframe;
+	WNaviframeController *self = view ? view->__naviframe : nullptr;
 	if (!self)
 		return EINA_TRUE;
 	self->__popCbRan = true;
@@ -196,18 +196,25 @@ Eina_Bool WNaviframeController::__itemPopCb(void *data, Elm_Object_Item *item)
 	}
 	view->__popped = true;
 	view->__naviItem = nullptr;
+	elm_object_item_data_set(item, nullptr);
 	view->onPop();
 	self->__scheduleTopCheck();
 	return EINA_TRUE;
 }
 
-void WNaviframeController::__onPageLeft(WContentViewController *view)
+// item is the page's naviframe item when it is still on the stack: its object went without a pop, so the item is
+// left without a page and goes too, once the current event is over.
+void WNaviframeController::__onPageLeft(WContentViewController *view, Elm_Object_Item *item)
 {
 	for (auto it = __pages.begin(); it != __pages.end(); ++it) {
 		if (*it == view) {
 			__pages.erase(it);
 			break;
 		}
+	}
+	if (item && !efl_invalidating_get(item) && !efl_invalidated_get(item)) {
+		elm_object_item_data_set(item, nullptr);
+		elm_naviframe_item_pop_cb_set(item, nullptr, nullptr);
 	}
 	__scheduleTopCheck();
 }
@@ -223,6 +230,14 @@ void WNaviframeController::__topCheckJobCb(void *data)
 {
 	WNaviframeController *self = static_cast<WNaviframeController *>(data);
 	self->__topCheckJob = nullptr;
+	// Items whose page went without a pop.
+	Eina_List *items = elm_naviframe_items_get(self->getEvasObj());
+	void *item;
+	EINA_LIST_FREE(items, item)
+	{
+		if (!elm_object_item_data_get(static_cast<Elm_Object_Item *>(item)))
+			elm_object_item_del(static_cast<Elm_Object_Item *>(item));
+	}
 	WContentViewController *top = self->getTopContentViewController();
 	if (top && top->__covered) {
 		top->__covered = false;

@@ -1,10 +1,12 @@
 #ifndef INC_BOX_MEMOBOXITEM_H
 #define INC_BOX_MEMOBOXITEM_H
 
+#include <functional>
 #include <string>
 #include <vector>
 
 #include <Elementary.h>
+#include <WUiTimer.h>
 
 #include "Box/IMemoBoxItemListener.h"
 #include "Box/MemoBoxItemType.h"
@@ -58,6 +60,9 @@ public:
 	char *getContentMarkupN();
 	// Replaces the entry's character limit by `maxChars` characters (no byte limit).
 	void setLimit(int maxChars);
+	// True when the entry holds no text at all. Unlike elm_entry_is_empty it never moves the cursor
+	// (which that call does when a change notice is still pending). Null counts as empty.
+	static bool isEntryEmpty(Evas_Object *entry);
 	// The next mouse up on the entry is ignored.
 	void setIgnoreMouseUp(bool ignore) { __ignoreMouseUp = ignore; }
 
@@ -81,6 +86,12 @@ public:
 private:
 	MemoBoxItem(const MemoBoxItem &) = delete;
 	MemoBoxItem &operator=(const MemoBoxItem &) = delete;
+
+	// A 0.0 s timer and an idler that run `func` with the item as data. They are bound to the outer
+	// layout and ended by the destructor, whichever goes first.
+	void __addTimer(std::function<bool(void *)> func);
+	void __addIdler(std::function<bool(void *)> func);
+	static void __onLayoutDelCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo);
 
 	// Layouts (MemoBoxItemLayout.cpp).
 	void __createTitleLayout();
@@ -171,6 +182,10 @@ private:
 	Ecore_Thread *__threadHandle;
 	// Workers still running for this item; the destructor detaches them so that their end cannot reach it.
 	std::vector<__ResizeJob *> __jobs;
+	// Timers and idlers started by the item.
+	std::vector<app_assist::WUiTimerHandle> __timers;
+	// The bus listener of a quick memo body being read; 0 when none.
+	unsigned int __busListenerId;
 };
 
 #endif

@@ -3,14 +3,9 @@
 
 #include <app_common.h>
 #include <app_control.h>
-#include <tizen.h>
-/* Siblings that Tizen's app.h brings in, when present in this tree. */
-#if __has_include(<app_i18n.h>)
 #include <app_i18n.h>
-#endif
-#if __has_include(<app_preference.h>)
 #include <app_preference.h>
-#endif
+#include <tizen.h>
 
 #ifdef __cplusplus
 extern "C" {
@@ -41,7 +36,7 @@ void ui_app_exit(void);
 
 /* Registers a system event callback; *event_handler is freed by ui_app_remove_event_handler. */
 int ui_app_add_event_handler(app_event_handler_h *event_handler, app_event_type_e event_type, app_event_cb callback,
-			     void *user_data);
+                             void *user_data);
 int ui_app_remove_event_handler(app_event_handler_h event_handler);
 
 #ifdef __cplusplus

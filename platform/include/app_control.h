@@ -84,7 +84,7 @@ typedef enum {
 /* Called on the requester's main loop with the callee's reply (or an empty one with CANCELED when the callee
    ended without replying). Both handles live for the call only. */
 typedef void (*app_control_reply_cb)(app_control_h request, app_control_h reply, app_control_result_e result,
-				     void *user_data);
+                                     void *user_data);
 /* Called once per extra data key; return false to stop. */
 typedef bool (*app_control_extra_data_cb)(app_control_h app_control, const char *key, void *user_data);
 /* Called once per registered application that can take the request; return false to stop. */

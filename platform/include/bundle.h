@@ -64,7 +64,7 @@ int bundle_keyval_get_type(bundle_keyval_t *kv);
 int bundle_keyval_type_is_array(bundle_keyval_t *kv);
 int bundle_keyval_get_basic_val(bundle_keyval_t *kv, void **val, size_t *size);
 int bundle_keyval_get_array_val(bundle_keyval_t *kv, void ***array_val, unsigned int *array_len,
-				size_t **array_element_size);
+                                size_t **array_element_size);
 
 /* Text form (base64 of a length-prefixed record list): *r is malloc'ed, free it with
    bundle_free_encoded_rawdata. bundle_decode returns a new bundle or NULL on malformed input. */

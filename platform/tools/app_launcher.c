@@ -2,6 +2,7 @@
 #include <Ecore.h>
 #include <app_control.h>
 #include <app_manager.h>
+#include <desktop/app_launch.h>
 #include <desktop/app_registry.h>
 
 #include <getopt.h>
@@ -10,20 +11,22 @@
 #include <string.h>
 
 #define DEFAULT_REPLY_TIMEOUT_SEC 10.0
+#define DELIVERY_TIMEOUT_SEC 5.0
 
 enum { EXIT_OK = 0, EXIT_FAILED = 1, EXIT_USAGE = 2 };
 
 static void usage(FILE *out)
 {
-	fprintf(out, "Usage:\n"
-		     "  app_launcher -s <appid> [-o operation] [-u uri] [-m mime] [-d key value]...\n"
-		     "               [-a key v1,v2,...]... [-r] [-t timeout]\n"
-		     "      send a launch request (the app is started when it is not running);\n"
-		     "      -r waits for the reply and prints its result and extra data, -t bounds the wait\n"
-		     "      in seconds (default %.0f)\n"
-		     "  app_launcher -k <appid>   ask a running app to end\n"
-		     "  app_launcher -l           list the registered apps\n",
-		DEFAULT_REPLY_TIMEOUT_SEC);
+	fprintf(out,
+	        "Usage:\n"
+	        "  app_launcher -s <appid> [-o operation] [-u uri] [-m mime] [-d key value]...\n"
+	        "               [-a key v1,v2,...]... [-r] [-t timeout]\n"
+	        "      send a launch request (the app is started when it is not running);\n"
+	        "      -r waits for the reply and prints its result and extra data, -t bounds the wait\n"
+	        "      in seconds (default %.0f)\n"
+	        "  app_launcher -k <appid>   ask a running app to end\n"
+	        "  app_launcher -l           list the registered apps\n",
+	        DEFAULT_REPLY_TIMEOUT_SEC);
 }
 
 static const char *error_text(int err)
@@ -130,8 +133,8 @@ static int add_array(app_control_h request, const char *key, const char *list)
 	char *save = NULL;
 	for (char *tok = copy ? strtok_r(copy, ",", &save) : NULL; tok && items; tok = strtok_r(NULL, ",", &save))
 		items[n++] = tok;
-	int ret = items && n ? app_control_add_extra_data_array(request, key, items, n)
-			     : APP_CONTROL_ERROR_INVALID_PARAMETER;
+	int ret =
+	    items && n ? app_control_add_extra_data_array(request, key, items, n) : APP_CONTROL_ERROR_INVALID_PARAMETER;
 	free(items);
 	free(copy);
 	return ret;
@@ -146,6 +149,10 @@ static int send_request(app_control_h request, const char *app_id, bool want_rep
 		return EXIT_FAILED;
 	}
 	if (!want_reply) {
+		if (desktop_app_launch_drain(DELIVERY_TIMEOUT_SEC) != APP_CONTROL_ERROR_NONE) {
+			fprintf(stderr, "app_launcher: %s did not take the request\n", app_id);
+			return EXIT_FAILED;
+		}
 		printf("launch request sent to %s\n", app_id);
 		return EXIT_OK;
 	}
@@ -166,6 +173,8 @@ static int terminate_app(const char *app_id)
 	app_control_create(&request);
 	app_control_set_app_id(request, app_id);
 	int ret = app_control_send_terminate_request(request);
+	if (ret == APP_CONTROL_ERROR_NONE)
+		desktop_app_launch_drain(DELIVERY_TIMEOUT_SEC);
 	app_control_destroy(request);
 	if (ret != APP_CONTROL_ERROR_NONE) {
 		fprintf(stderr, "app_launcher: %s is not running\n", app_id);

@@ -33,7 +33,7 @@ char *MemoBoxControl::getTodoListXmlN()
 	void *data = nullptr;
 	EINA_LIST_FOREACH(__itemList, l, data) {
 		MemoBoxItem *item = static_cast<MemoBoxItem *>(data);
-		if (!item->getEntry() || elm_entry_is_empty(item->getEntry()))
+		if (!item->getEntry() || MemoBoxItem::isEntryEmpty(item->getEntry()))
 			continue;
 		const _MemoBoxItemType type = item->getType();
 		const bool checked = memoBoxItemIsCheck(type) && item->getCheckStatus();

@@ -124,8 +124,9 @@ void MemoBoxControl::onUnpackRequested(Evas_Object *entry, void *item)
 	}
 	// The removed text goes behind the neighbour's text, also when the neighbour came after it.
 	Evas_Object *source = removed->getEntry();
-	if (target && source && !elm_entry_is_empty(source)) {
-		const std::string text = elm_entry_entry_get(source);
+	const char *removedText = source ? elm_entry_entry_get(source) : nullptr;
+	if (target && removedText && *removedText) {
+		const std::string text = removedText;
 		elm_entry_entry_insert(target, text.c_str());
 		elm_entry_cursor_pos_set(target, position);
 	}

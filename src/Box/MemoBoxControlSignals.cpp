@@ -6,13 +6,24 @@
 #include "DataBase/MemoDocInfo.h"
 #include "MemoLog.h"
 
+namespace
+{
+// Emptiness from the text itself: elm_entry_is_empty moves the entry's cursor, and these checks run
+// inside "changed", which an entry may raise while it is moving its cursor.
+bool hasText(Evas_Object *entry)
+{
+	const char *text = entry ? elm_entry_entry_get(entry) : nullptr;
+	return text && *text;
+}
+} // namespace
+
 bool MemoBoxControl::__areBodyItemsEmpty() const
 {
 	Eina_List *l = nullptr;
 	void *data = nullptr;
 	EINA_LIST_FOREACH(__itemList, l, data) {
 		Evas_Object *entry = static_cast<MemoBoxItem *>(data)->getEntry();
-		if (entry && !elm_entry_is_empty(entry))
+		if (hasText(entry))
 			return false;
 	}
 	return true;
@@ -41,7 +52,7 @@ void MemoBoxControl::onEntryChanged(Evas_Object *entry, void *item)
 	}
 	// A new memo or an edited one with a title may be saved even with an empty body.
 	Evas_Object *title = __titleItem ? __titleItem->getEntry() : nullptr;
-	if (title && !elm_entry_is_empty(title)) {
+	if (hasText(title)) {
 		__signal.emit("action,done,enable", nullptr);
 		return;
 	}

@@ -12,12 +12,19 @@
 
 namespace
 {
-// Whether the cursor stands away from the line's left edge, so that a tag needs a break in front.
+// Whether the cursor stands away from the line's left edge, so that a tag needs a break in front. The
+// cursor's x is taken from where the text starts, not from the entry's padded edge.
 bool cursorPastLeftEdge(Evas_Object *entry)
 {
-	Evas_Coord x = 0;
-	elm_entry_cursor_geometry_get(entry, &x, nullptr, nullptr, nullptr);
-	return x > 10 * elm_config_scale_get() / elm_app_base_scale_get();
+	Evas_Coord cursorX = 0, entryX = 0, textX = 0;
+	elm_entry_cursor_geometry_get(entry, &cursorX, nullptr, nullptr, nullptr);
+	evas_object_geometry_get(entry, &entryX, nullptr, nullptr, nullptr);
+	Evas_Object *textblock = elm_entry_textblock_get(entry);
+	if (textblock)
+		evas_object_geometry_get(textblock, &textX, nullptr, nullptr, nullptr);
+	else
+		textX = entryX;
+	return cursorX - (textX - entryX) > 10 * elm_config_scale_get() / elm_app_base_scale_get();
 }
 } // namespace
 

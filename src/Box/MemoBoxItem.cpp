@@ -4,17 +4,20 @@
 
 #include <app_i18n.h>
 
+#include <algorithm>
+
 #include "MemoBoxItemPrivate.h"
 #include "Box/MemoContentMarkup.h"
 #include "MemoLog.h"
+#include "Model/MemoBroadCaster.h"
 #include "Util/MemoUtil.h"
 
 MemoBoxItem::MemoBoxItem(_MemoBoxItemType type, const char *memoUuid, bool isEditable)
-	: __layoutObj(nullptr), __entryObj(nullptr), __checkObj(nullptr), __innerLayoutObj(nullptr),
-	  __favoriteObj(nullptr), __type(type), __listener(nullptr), __isEditable(isEditable), __imgPathList(nullptr),
-	  __imgObjList(nullptr), __limit(), __pressX(0), __pressY(0), __ignoreMouseUp(false), __longPressed(false),
-	  __resizeWidth(0), __resizeHeight(0), __resizeRatio(1.0f), __pendingThreads(0), __lastCursorPos(0),
-	  __memoUuid(memoUuid ? memoUuid : ""), __threadHandle(nullptr)
+    : __layoutObj(nullptr), __entryObj(nullptr), __checkObj(nullptr), __innerLayoutObj(nullptr), __favoriteObj(nullptr),
+      __type(type), __listener(nullptr), __isEditable(isEditable), __imgPathList(nullptr), __imgObjList(nullptr),
+      __limit(), __pressX(0), __pressY(0), __ignoreMouseUp(false), __longPressed(false), __resizeWidth(0),
+      __resizeHeight(0), __resizeRatio(1.0f), __pendingThreads(0), __lastCursorPos(0),
+      __memoUuid(memoUuid ? memoUuid : ""), __threadHandle(nullptr)
 {
 	__limit.max_char_count = MEMO_BOX_BODY_CHAR_LIMIT;
 	__limit.max_byte_count = 0;
@@ -23,6 +26,9 @@ MemoBoxItem::MemoBoxItem(_MemoBoxItemType type, const char *memoUuid, bool isEdi
 MemoBoxItem::~MemoBoxItem()
 {
 	__listener = nullptr;
+	for (const app_assist::WUiTimerHandle &timer : __timers)
+		app_assist::WUiTimer::deleteTimer(timer);
+	__timers.clear();
 
 	Eina_List *l = nullptr;
 	void *obj = nullptr;
@@ -35,6 +41,18 @@ MemoBoxItem::~MemoBoxItem()
 	free(path);
 
 	__detachResizeJobs();
+
+	// An owner may delete its items before their layouts. The widgets that call back into the item
+	// go now, so that no focus move or key reaches it later; the empty outer layout stays the owner's.
+	if (__layoutObj) {
+		evas_object_event_callback_del_full(__layoutObj, EVAS_CALLBACK_DEL, __onLayoutDelCb, this);
+		if (__busListenerId)
+			MemoBroadCaster::getInstance().removeListener(__busListenerId);
+		if (__innerLayoutObj) {
+			elm_object_part_content_unset(__layoutObj, "content");
+			evas_object_del(__innerLayoutObj);
+		}
+	}
 }
 
 Evas_Object *MemoBoxItem::create(Evas_Object *parent, void *param, IMemoBoxItemListener *listener)
@@ -56,6 +74,7 @@ Evas_Object *MemoBoxItem::create(Evas_Object *parent, void *param, IMemoBoxItemL
 	evas_object_show(layout);
 	__layoutObj = layout;
 	__listener = listener;
+	evas_object_event_callback_add(layout, EVAS_CALLBACK_DEL, __onLayoutDelCb, this);
 
 	if (__type == MEMO_BOX_ITEM_TITLE || __type == MEMO_BOX_ITEM_QUICK_TITLE)
 		__createTitleLayout();
@@ -93,23 +112,21 @@ void MemoBoxItem::insertText(const char *text)
 			return;
 		if (__type == MEMO_BOX_ITEM_QUICK_TITLE)
 			elm_object_domain_translatable_part_text_set(__innerLayoutObj, "title", MEMO_SUB_DOMAIN,
-														 "IDS_MEMO_HEADER_QUICK_MEMO");
+			                                             "IDS_MEMO_HEADER_QUICK_MEMO");
 		else
 			elm_object_part_text_set(__innerLayoutObj, "title", text);
 		return;
 	}
 	elm_entry_entry_insert(__entryObj, text);
 	if (__type == MEMO_BOX_ITEM_FIRST_TEXT) {
-		app_assist::WUiTimer::addIdler(
-			[](void *data) {
-				MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
-				if (self->__entryObj) {
-					elm_object_focus_set(self->__entryObj, EINA_TRUE);
-					elm_entry_cursor_end_set(self->__entryObj);
-				}
-				return false;
-			},
-			this, __layoutObj);
+		__addIdler([](void *data) {
+			MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
+			if (self->__entryObj) {
+				elm_object_focus_set(self->__entryObj, EINA_TRUE);
+				elm_entry_cursor_end_set(self->__entryObj);
+			}
+			return false;
+		});
 	}
 }
 
@@ -156,7 +173,7 @@ void MemoBoxItem::showGuideText(bool show)
 		MEMO_LOGE("__entryObj is NULL");
 		return;
 	}
-	if (__type == MEMO_BOX_ITEM_FIRST_TEXT && __isEditable && elm_entry_is_empty(__entryObj) && show)
+	if (__type == MEMO_BOX_ITEM_FIRST_TEXT && __isEditable && isEntryEmpty(__entryObj) && show)
 		elm_object_domain_translatable_part_text_set(__entryObj, "elm.guide", MEMO_SUB_DOMAIN, "IDS_MEMO_BODY_MEMO");
 	else
 		elm_object_domain_translatable_part_text_set(__entryObj, "elm.guide", nullptr, "");
@@ -177,4 +194,41 @@ void MemoBoxItem::setLimit(int maxChars)
 		return;
 	elm_entry_markup_filter_remove(__entryObj, elm_entry_filter_limit_size, &__limit);
 	elm_entry_markup_filter_append(__entryObj, elm_entry_filter_limit_size, &__limit);
+}
+
+bool MemoBoxItem::isEntryEmpty(Evas_Object *entry)
+{
+	const char *text = entry ? elm_entry_entry_get(entry) : nullptr;
+	return !text || !*text;
+}
+
+void MemoBoxItem::__onLayoutDelCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo)
+{
+	(void)e;
+	(void)obj;
+	(void)eventInfo;
+	MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
+	// Everything inside goes with it; the bus drops its listener by itself.
+	self->__layoutObj = nullptr;
+	self->__innerLayoutObj = nullptr;
+	self->__entryObj = nullptr;
+	self->__checkObj = nullptr;
+	self->__favoriteObj = nullptr;
+	self->__busListenerId = 0;
+}
+
+void MemoBoxItem::__addTimer(std::function<bool(void *)> func)
+{
+	__timers.erase(std::remove_if(__timers.begin(), __timers.end(),
+	                              [](const app_assist::WUiTimerHandle &timer) { return timer.expired(); }),
+	               __timers.end());
+	__timers.push_back(app_assist::WUiTimer::addTimer(0.0, std::move(func), this, __layoutObj));
+}
+
+void MemoBoxItem::__addIdler(std::function<bool(void *)> func)
+{
+	__timers.erase(std::remove_if(__timers.begin(), __timers.end(),
+	                              [](const app_assist::WUiTimerHandle &timer) { return timer.expired(); }),
+	               __timers.end());
+	__timers.push_back(app_assist::WUiTimer::addIdler(std::move(func), this, __layoutObj));
 }

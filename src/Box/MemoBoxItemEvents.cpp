@@ -11,8 +11,6 @@
 #include "MemoBoxItemPrivate.h"
 #include "MemoLog.h"
 
-using app_assist::WUiTimer;
-
 void MemoBoxItem::__onEntryChangedCb(void *data, Evas_Object *obj, void *eventInfo)
 {
 	(void)eventInfo;
@@ -20,8 +18,8 @@ void MemoBoxItem::__onEntryChangedCb(void *data, Evas_Object *obj, void *eventIn
 	self->__lastCursorPos = elm_entry_cursor_pos_get(obj);
 	if (self->__listener)
 		self->__listener->onEntryChanged(obj, self);
-	if (self->__type == MEMO_BOX_ITEM_FIRST_TEXT && self->__entryObj && elm_entry_is_empty(self->__entryObj) == 1 &&
-		self->__listener)
+	if (self->__type == MEMO_BOX_ITEM_FIRST_TEXT && self->__entryObj && isEntryEmpty(self->__entryObj) &&
+	    self->__listener)
 		self->__listener->onCheckGuideText(self);
 }
 
@@ -83,7 +81,7 @@ void MemoBoxItem::__onEntryMouseUpCb(void *data, Evas *e, Evas_Object *obj, void
 		return;
 	}
 	if (abs(ev->canvas.x - self->__pressX) > MEMO_BOX_TAP_MOVE_LIMIT ||
-		abs(ev->canvas.y - self->__pressY) > MEMO_BOX_TAP_MOVE_LIMIT)
+	    abs(ev->canvas.y - self->__pressY) > MEMO_BOX_TAP_MOVE_LIMIT)
 		return;
 
 	if (!elm_object_focus_get(obj)) {
@@ -93,7 +91,7 @@ void MemoBoxItem::__onEntryMouseUpCb(void *data, Evas *e, Evas_Object *obj, void
 			Evas_Coord tx = 0, ty = 0;
 			evas_object_geometry_get(textblock, &tx, &ty, nullptr, nullptr);
 			evas_textblock_cursor_cluster_coord_set(evas_object_textblock_cursor_get(textblock), ev->canvas.x - tx,
-													ev->canvas.y - ty);
+			                                        ev->canvas.y - ty);
 		}
 	}
 
@@ -110,15 +108,13 @@ void MemoBoxItem::__onEntryMouseUpCb(void *data, Evas *e, Evas_Object *obj, void
 		self->__listener->suspendKeypad();
 	// The path is copied: the image object that holds it may go before the idler runs.
 	std::string *selected = new std::string(path);
-	WUiTimer::addIdler(
-		[selected](void *idlerData) {
-			MemoBoxItem *item = static_cast<MemoBoxItem *>(idlerData);
-			if (item->__listener)
-				item->__listener->onImageSelected(selected->c_str());
-			delete selected;
-			return false;
-		},
-		self, self->__layoutObj);
+	self->__addIdler([selected](void *idlerData) {
+		MemoBoxItem *item = static_cast<MemoBoxItem *>(idlerData);
+		if (item->__listener)
+			item->__listener->onImageSelected(selected->c_str());
+		delete selected;
+		return false;
+	});
 }
 
 void MemoBoxItem::__onCheckChangedCb(void *data, Evas_Object *obj, void *eventInfo)
@@ -152,16 +148,14 @@ void MemoBoxItem::__onCheckMouseUpCb(void *data, Evas *e, Evas_Object *obj, void
 	(void)obj;
 	(void)eventInfo;
 	MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
-	WUiTimer::addIdler(
-		[](void *idlerData) {
-			MemoBoxItem *item = static_cast<MemoBoxItem *>(idlerData);
-			if (item->__listener) {
-				item->__listener->resumeKeypad();
-				item->__listener->onFocusCurrentItem();
-			}
-			return false;
-		},
-		self, self->__layoutObj);
+	self->__addIdler([](void *idlerData) {
+		MemoBoxItem *item = static_cast<MemoBoxItem *>(idlerData);
+		if (item->__listener) {
+			item->__listener->resumeKeypad();
+			item->__listener->onFocusCurrentItem();
+		}
+		return false;
+	});
 	elm_config_focus_autoscroll_mode_set(ELM_FOCUS_AUTOSCROLL_MODE_SHOW);
 }
 

@@ -8,8 +8,6 @@
 #include "MemoBoxItemPrivate.h"
 #include "MemoLog.h"
 
-using app_assist::WUiTimer;
-
 void MemoBoxItem::__onEntryActivateCb(void *data, Evas_Object *obj, void *eventInfo)
 {
 	(void)eventInfo;
@@ -36,17 +34,14 @@ void MemoBoxItem::__onCheckReturn()
 		// Return on an empty check line leaves the list.
 		elm_entry_entry_set(entry, nullptr);
 		changeMode();
-		WUiTimer::addTimer(
-			0.0,
-			[](void *data) {
-				MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
-				if (self->__entryObj) {
-					elm_entry_cursor_end_set(self->__entryObj);
-					elm_object_focus_set(self->__entryObj, EINA_TRUE);
-				}
-				return false;
-			},
-			this, __layoutObj);
+		__addTimer([](void *data) {
+			MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
+			if (self->__entryObj) {
+				elm_entry_cursor_end_set(self->__entryObj);
+				elm_object_focus_set(self->__entryObj, EINA_TRUE);
+			}
+			return false;
+		});
 		return;
 	}
 
@@ -67,7 +62,8 @@ void MemoBoxItem::__onEntryKeyDownCb(void *data, Evas *e, Evas_Object *obj, void
 	(void)e;
 	MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
 	Evas_Event_Key_Down *ev = static_cast<Evas_Event_Key_Down *>(eventInfo);
-	if (!ev || !ev->keyname)
+	// A memo being read takes no editing keys.
+	if (!ev || !ev->keyname || !self->__isEditable)
 		return;
 	// The entry has handled the key already: a Return has typed its break.
 	if (!strcmp(ev->keyname, "Return") || !strcmp(ev->keyname, "KP_Enter")) {
@@ -89,34 +85,28 @@ void MemoBoxItem::__onBackSpaceKey(Evas_Object *entry)
 	}
 
 	if (memoBoxItemIsCheck(__type)) {
-		if (!elm_entry_is_empty(entry)) {
+		if (!isEntryEmpty(entry)) {
 			changeMode();
-			WUiTimer::addTimer(
-				0.0,
-				[](void *data) {
-					MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
-					if (self->__entryObj) {
-						elm_entry_cursor_begin_set(self->__entryObj);
-						self->__lastCursorPos = 0;
-						elm_object_focus_set(self->__entryObj, EINA_TRUE);
-					}
-					return false;
-				},
-				this, __layoutObj);
+			__addTimer([](void *data) {
+				MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
+				if (self->__entryObj) {
+					elm_entry_cursor_begin_set(self->__entryObj);
+					self->__lastCursorPos = 0;
+					elm_object_focus_set(self->__entryObj, EINA_TRUE);
+				}
+				return false;
+			});
 		} else {
 			evas_object_event_callback_del_full(entry, EVAS_CALLBACK_KEY_DOWN, __onEntryKeyDownCb, this);
 			changeMode();
-			WUiTimer::addTimer(
-				0.0,
-				[](void *data) {
-					MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
-					if (self->__entryObj) {
-						elm_entry_cursor_end_set(self->__entryObj);
-						elm_object_focus_set(self->__entryObj, EINA_TRUE);
-					}
-					return false;
-				},
-				this, __layoutObj);
+			__addTimer([](void *data) {
+				MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
+				if (self->__entryObj) {
+					elm_entry_cursor_end_set(self->__entryObj);
+					elm_object_focus_set(self->__entryObj, EINA_TRUE);
+				}
+				return false;
+			});
 		}
 		__lastCursorPos = pos;
 		return;

@@ -7,6 +7,8 @@
 #include <uxt_edit_field.h>
 #include <uxt_entry.h>
 
+#include <cstring>
+
 #include "MemoBoxItemPrivate.h"
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
@@ -19,7 +21,24 @@ Elm_Entry_Filter_Limit_Size gTitleLimit = {MEMO_BOX_TITLE_CHAR_LIMIT, MEMO_BOX_T
 
 const char *const TITLE_BACK_MARK = "eext_entry";
 
-Evas_Coord scaled(int size) { return static_cast<Evas_Coord>(size * elm_config_scale_get() / elm_app_base_scale_get()); }
+// The scrolling field of the toolkit paints a background of its own; the title shows the page instead.
+void clearFieldBackground(Evas_Object *entry)
+{
+	Eina_List *members = evas_object_smart_members_get(entry);
+	void *member = nullptr;
+	EINA_LIST_FREE(members, member)
+	{
+		Evas_Object *obj = static_cast<Evas_Object *>(member);
+		const char *type = evas_object_type_get(obj);
+		if (type && !strcmp(type, "edje"))
+			edje_object_color_class_set(obj, "/bg/normal/entry", 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0);
+	}
+}
+
+Evas_Coord scaled(int size)
+{
+	return static_cast<Evas_Coord>(size * elm_config_scale_get() / elm_app_base_scale_get());
+}
 } // namespace
 
 void MemoBoxItem::__createTitleLayout()
@@ -50,6 +69,9 @@ void MemoBoxItem::__createTitleLayout()
 		elm_entry_markup_filter_append(entry, __titleFilter, this);
 		elm_entry_markup_filter_append(entry, elm_entry_filter_limit_size, &gTitleLimit);
 		elm_entry_input_panel_return_key_type_set(entry, ELM_INPUT_PANEL_RETURN_KEY_TYPE_NEXT);
+		// The title sits on the page itself: no field background, bold dark text.
+		clearFieldBackground(entry);
+		elm_entry_text_style_user_push(entry, MEMO_BOX_TEXT_STYLE_TITLE);
 		__entryObj = entry;
 	}
 
@@ -59,7 +81,7 @@ void MemoBoxItem::__createTitleLayout()
 		elm_object_part_content_set(layout, "favorite", star);
 		__favoriteObj = star;
 		Evas_Object *touch =
-			const_cast<Evas_Object *>(edje_object_part_object_get(elm_layout_edje_get(layout), "favourite.touch"));
+		    const_cast<Evas_Object *>(edje_object_part_object_get(elm_layout_edje_get(layout), "favourite.touch"));
 		if (touch)
 			evas_object_event_callback_add(touch, EVAS_CALLBACK_MOUSE_UP, __onFavoriteMouseUpCb, this);
 		else
@@ -75,7 +97,7 @@ void MemoBoxItem::__createTitleLayout()
 		elm_image_aspect_fixed_set(icon, EINA_FALSE);
 		int r = 97, g = 97, b = 97, a = 255;
 		edje_object_color_class_get(elm_layout_edje_get(layout), "AO005", &r, &g, &b, &a, nullptr, nullptr, nullptr,
-									nullptr, nullptr, nullptr, nullptr, nullptr);
+		                            nullptr, nullptr, nullptr, nullptr, nullptr);
 		evas_object_color_set(icon, r * a / 255, g * a / 255, b * a / 255, a);
 		elm_object_part_content_set(layout, "favorite", icon);
 	}
@@ -98,8 +120,8 @@ void MemoBoxItem::__createInnerLayout()
 	elm_layout_file_set(layout, MemoUtil::getEdjePath(), isCheck ? "box_item_check" : "box_item_text");
 	evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, 0.0);
 	evas_object_size_hint_align_set(layout, EVAS_HINT_FILL, 0.0);
-	const bool isTop = __type == MEMO_BOX_ITEM_FIRST_CHECK || __type == MEMO_BOX_ITEM_FIRST_TEXT ||
-					   __type == MEMO_BOX_ITEM_QUICK_TEXT;
+	const bool isTop =
+	    __type == MEMO_BOX_ITEM_FIRST_CHECK || __type == MEMO_BOX_ITEM_FIRST_TEXT || __type == MEMO_BOX_ITEM_QUICK_TEXT;
 	elm_object_signal_emit(layout, isTop ? "top,item" : "normal,item", "elm");
 	evas_object_show(layout);
 	elm_object_part_content_set(__layoutObj, "content", layout);
@@ -122,8 +144,9 @@ void MemoBoxItem::__createInnerLayout()
 	if (__type == MEMO_BOX_ITEM_FIRST_TEXT && __listener)
 		__listener->onCheckGuideText(this);
 	if (__type == MEMO_BOX_ITEM_QUICK_TEXT && !__isEditable) {
-		MemoBroadCaster::getInstance().addListener(
-			[this](const char *, void *) { __setQuickPanelDescription(); }, __layoutObj);
+		if (!__busListenerId)
+			__busListenerId = MemoBroadCaster::getInstance().addListener(
+			    [this](const char *, void *) { __setQuickPanelDescription(); }, __layoutObj);
 		__setQuickPanelDescription();
 	}
 
@@ -163,7 +186,7 @@ void MemoBoxItem::__setQuickPanelDescription()
 		return;
 	}
 	std::string text =
-		i18n_get_text("IDS_MEMO_BODY_COLLECT_TEXT_FROM_ANY_APP_BY_SELECTING_IT_AND_TAPPING_QUICK_MEMO_MSG");
+	    i18n_get_text("IDS_MEMO_BODY_COLLECT_TEXT_FROM_ANY_APP_BY_SELECTING_IT_AND_TAPPING_QUICK_MEMO_MSG");
 	memoBoxReplaceAll(text, "\n", MEMO_BOX_LINE_BREAK);
 	elm_object_part_text_set(__entryObj, "elm.guide", text.c_str());
 }

@@ -9,8 +9,6 @@
 #include "MemoBoxItemPrivate.h"
 #include "MemoLog.h"
 
-using app_assist::WUiTimer;
-
 namespace
 {
 const char *const NBSP = "\xC2\xA0";
@@ -143,7 +141,8 @@ void MemoBoxItem::changeMode()
 
 	std::string before, after;
 	__splitAtCursor(before, after, false);
-	const _MemoBoxItemType checkType = __type == MEMO_BOX_ITEM_FIRST_TEXT ? MEMO_BOX_ITEM_FIRST_CHECK : MEMO_BOX_ITEM_CHECK;
+	const _MemoBoxItemType checkType =
+	    __type == MEMO_BOX_ITEM_FIRST_TEXT ? MEMO_BOX_ITEM_FIRST_CHECK : MEMO_BOX_ITEM_CHECK;
 	const size_t breakInAfter = after.find(MEMO_BOX_LINE_BREAK);
 
 	if (before.empty()) {
@@ -201,26 +200,20 @@ void MemoBoxItem::changeMode()
 	if (!checkItem)
 		return;
 	MemoBoxItem *textItem =
-		__listener->onAddRequested(checkItem->getEntry(), MEMO_BOX_ITEM_TEXT, rest.c_str(), checkItem);
+	    __listener->onAddRequested(checkItem->getEntry(), MEMO_BOX_ITEM_TEXT, rest.c_str(), checkItem);
 	if (!textItem)
 		return;
-	// Two timers, each bound to the item it touches, so that neither can reach a deleted item.
-	WUiTimer::addTimer(
-		0.0,
-		[](void *data) {
-			MemoBoxItem *text = static_cast<MemoBoxItem *>(data);
-			if (text->getEntry())
-				elm_entry_input_panel_enabled_set(text->getEntry(), EINA_TRUE);
-			return false;
-		},
-		textItem, textItem->getLayout());
-	WUiTimer::addTimer(
-		0.0,
-		[](void *data) {
-			MemoBoxItem *check = static_cast<MemoBoxItem *>(data);
-			if (check->getEntry())
-				elm_object_focus_set(check->getEntry(), EINA_TRUE);
-			return false;
-		},
-		checkItem, checkItem->getLayout());
+	// Each timer belongs to the item it touches, so that neither can reach a deleted item.
+	textItem->__addTimer([](void *data) {
+		MemoBoxItem *text = static_cast<MemoBoxItem *>(data);
+		if (text->getEntry())
+			elm_entry_input_panel_enabled_set(text->getEntry(), EINA_TRUE);
+		return false;
+	});
+	checkItem->__addTimer([](void *data) {
+		MemoBoxItem *check = static_cast<MemoBoxItem *>(data);
+		if (check->getEntry())
+			elm_object_focus_set(check->getEntry(), EINA_TRUE);
+		return false;
+	});
 }

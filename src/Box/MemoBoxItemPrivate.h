@@ -22,6 +22,8 @@ const int MEMO_BOX_TAP_MOVE_LIMIT = 20;
 #define MEMO_BOX_TEXT_STYLE_NORMAL "DEFAULT='color=#000000ff'"
 #define MEMO_BOX_TEXT_STYLE_CHECKED "DEFAULT='strikethrough=on strikethrough_color=#00000050 color=#00000064'"
 
+#define MEMO_BOX_TEXT_STYLE_TITLE "DEFAULT='font_weight=Bold color=#221e14ff'"
+
 #define MEMO_BOX_LINE_BREAK "<br/>"
 
 // One picture to shrink on a worker. The worker reads only its own copy of the parameters; `item` is

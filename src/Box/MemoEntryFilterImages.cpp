@@ -188,7 +188,7 @@ void MemoBoxItem::__queueResizeWorkers(const std::vector<std::string> &paths)
 MemoBoxItem::__ResizeJob *MemoBoxItem::__startResizeWorker(bool insertsPendingText)
 {
 	__ResizeJob *job =
-		new __ResizeJob{this, __resizePath, __resizeWidth, __resizeHeight, __resizeRatio, insertsPendingText, nullptr};
+	    new __ResizeJob{this, __resizePath, __resizeWidth, __resizeHeight, __resizeRatio, insertsPendingText, nullptr};
 	__jobs.push_back(job);
 	Ecore_Thread *thread = ecore_thread_run(__resizeWorkerCb, __resizeWorkerEndCb, __resizeWorkerCancelCb, job);
 	// A failed start has already run the cancel callback, which freed the job.

@@ -100,6 +100,18 @@ TEST_F(NaviframeTest, PopOutOfAPageBelowTheTopRemovesOnlyIt)
 	EXPECT_EQ(Log(bEntries.end() - 3, bEntries.end()), (Log{"onPop", "onDestroy", "destructor"}));
 }
 
+TEST_F(NaviframeTest, DestroyingAPageObjectTakesItsItemAlong)
+{
+	LoggingPage *a = new LoggingPage("A", &log);
+	ASSERT_TRUE(naviframe->push(a));
+	ASSERT_TRUE(naviframe->push(new LoggingPage("B", &log)));
+	naviframe->getTopContentViewController()->destroy();
+	EXPECT_EQ(entriesOf("B").back(), "destructor");
+	ASSERT_TRUE(waitFor([&] { return hasEntry("A:onBecomeTop"); }));
+	EXPECT_EQ(naviframe->getTopContentViewController(), a);
+	EXPECT_EQ(naviframe->getContentViewCount(), 1);
+}
+
 TEST_F(NaviframeTest, LastPageHookDecidesWhetherThePopGoesOn)
 {
 	LoggingPage *a = new LoggingPage("A", &log);

@@ -81,8 +81,7 @@ static bool copy_extra_cb(app_control_h request, const char *key, void *user_dat
 static bool extra_is(app_control_h request, const char *key, const char *expected)
 {
 	char *value = NULL;
-	bool match = app_control_get_extra_data(request, key, &value) == APP_CONTROL_ERROR_NONE &&
-		     !strcmp(value, expected);
+	bool match = app_control_get_extra_data(request, key, &value) == APP_CONTROL_ERROR_NONE && !strcmp(value, expected);
 	free(value);
 	return match;
 }

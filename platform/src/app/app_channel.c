@@ -1,10 +1,14 @@
 /* Names and connections of the apps' launch sockets (Ecore_Ipc, local to the user). */
+#define _GNU_SOURCE
 #ifndef EFL_BETA_API_SUPPORT
 #define EFL_BETA_API_SUPPORT 1 /* eina_vpath: the folder Ecore_Con puts local sockets in */
 #endif
 #include "app_private.h"
 
 #include <Eina.h>
+#include <dlog.h>
+#include <inttypes.h>
+#include <stdint.h>
 #include <stdio.h>
 #include <stdlib.h>
 #include <string.h>
@@ -21,14 +25,40 @@ static void channel_init(void)
 	done = true;
 }
 
+/* Where Ecore_Con puts the user-local socket of name; the length written, or -1 when it does not fit. */
+static int socket_path_get(const char *name, char *path, size_t size)
+{
+	int n = eina_vpath_resolve_snprintf(path, size, "(:usr.run:)/.ecore/%s/0", name);
+	return n <= 0 || (size_t)n >= size ? -1 : n;
+}
+
+static uint64_t fnv1a(const char *s)
+{
+	uint64_t h = 1469598103934665603ULL;
+	for (; *s; s++)
+		h = (h ^ (unsigned char)*s) * 1099511628211ULL;
+	return h;
+}
+
 char *app_channel_name_get(const char *app_id)
 {
 	if (!app_id)
 		return NULL;
-	size_t n = strlen("tizen-app-") + strlen(app_id) + 1;
-	char *name = malloc(n);
-	if (name)
-		snprintf(name, n, "tizen-app-%s", app_id);
+	char *name = NULL;
+	if (asprintf(&name, "tizen-app-%s", app_id) < 0)
+		return NULL;
+	/* Socket paths are short (108 bytes): a long id is cut and made unique by its hash. */
+	char path[sizeof(((struct sockaddr_un *)0)->sun_path)];
+	if (socket_path_get(name, path, sizeof(path)) < 0) {
+		free(name);
+		if (asprintf(&name, "tizen-app-%.16s-%016" PRIx64, app_id, fnv1a(app_id)) < 0)
+			return NULL;
+		if (socket_path_get(name, path, sizeof(path)) < 0) {
+			LOGE("the runtime folder is too deep for a socket of %s", app_id);
+			free(name);
+			return NULL;
+		}
+	}
 	return name;
 }
 
@@ -38,8 +68,8 @@ char *app_channel_name_get(const char *app_id)
 static bool socket_accepts(const char *name)
 {
 	char path[sizeof(((struct sockaddr_un *)0)->sun_path)];
-	int n = eina_vpath_resolve_snprintf(path, sizeof(path), "(:usr.run:)/.ecore/%s/0", name);
-	if (n <= 0 || (size_t)n >= sizeof(path))
+	int n = socket_path_get(name, path, sizeof(path));
+	if (n < 0)
 		return false;
 	int fd = socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0);
 	if (fd < 0)
@@ -64,6 +94,16 @@ Ecore_Ipc_Server *app_channel_connect(const char *app_id)
 		server = ecore_ipc_server_connect(ECORE_IPC_LOCAL_USER, name, 0, NULL);
 	free(name);
 	return server;
+}
+
+void app_channel_stale_remove(const char *name)
+{
+	char path[sizeof(((struct sockaddr_un *)0)->sun_path)];
+	if (socket_path_get(name, path, sizeof(path)) < 0 || access(path, F_OK) != 0 || socket_accepts(name))
+		return;
+	/* Left by an instance that died: a new server could not listen while it is there. */
+	if (unlink(path) == 0)
+		LOGI("removed the stale socket %s", path);
 }
 
 bool app_channel_is_running(const char *app_id)

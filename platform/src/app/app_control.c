@@ -132,17 +132,17 @@ static int get_field(const char *field, char **out, const char *func)
 }
 
 #define FIELD_ACCESSORS(name)                                                                                          \
-	int app_control_set_##name(app_control_h app_control, const char *name)                                       \
-	{                                                                                                              \
-		if (!app_control)                                                                                      \
-			return INVALID_PARAMETER();                                                                    \
-		return set_field(&app_control->name, name, __func__);                                                  \
-	}                                                                                                              \
-	int app_control_get_##name(app_control_h app_control, char **name)                                            \
-	{                                                                                                              \
-		if (!app_control || !name)                                                                             \
-			return INVALID_PARAMETER();                                                                    \
-		return get_field(app_control->name, name, __func__);                                                   \
+	int app_control_set_##name(app_control_h app_control, const char *name)                                            \
+	{                                                                                                                  \
+		if (!app_control)                                                                                              \
+			return INVALID_PARAMETER();                                                                                \
+		return set_field(&app_control->name, name, __func__);                                                          \
+	}                                                                                                                  \
+	int app_control_get_##name(app_control_h app_control, char **name)                                                 \
+	{                                                                                                                  \
+		if (!app_control || !name)                                                                                     \
+			return INVALID_PARAMETER();                                                                                \
+		return get_field(app_control->name, name, __func__);                                                           \
 	}
 
 FIELD_ACCESSORS(operation)
@@ -294,7 +294,9 @@ int app_control_is_extra_data_array(app_control_h app_control, const char *key, 
 }
 
 typedef struct {
-	Eina_List *keys;
+	char **keys;
+	int count;
+	int capacity;
 } key_snapshot_s;
 
 static void collect_key_cb(const char *key, const int type, const bundle_keyval_t *kv, void *user_data)
@@ -302,8 +304,19 @@ static void collect_key_cb(const char *key, const int type, const bundle_keyval_
 	(void)type;
 	(void)kv;
 	key_snapshot_s *snap = user_data;
-	if (!app_control_key_is_reserved(key))
-		snap->keys = eina_list_append(snap->keys, strdup(key));
+	if (app_control_key_is_reserved(key))
+		return;
+	if (snap->count == snap->capacity) {
+		int cap = snap->capacity ? snap->capacity * 2 : 8;
+		char **keys = realloc(snap->keys, cap * sizeof(char *));
+		if (!keys)
+			return;
+		snap->keys = keys;
+		snap->capacity = cap;
+	}
+	snap->keys[snap->count] = strdup(key);
+	if (snap->keys[snap->count])
+		snap->count++;
 }
 
 int app_control_foreach_extra_data(app_control_h app_control, app_control_extra_data_cb callback, void *user_data)
@@ -311,16 +324,15 @@ int app_control_foreach_extra_data(app_control_h app_control, app_control_extra_
 	if (!app_control || !callback)
 		return INVALID_PARAMETER();
 	/* Keys are copied first so that the callback may change the extra data. */
-	key_snapshot_s snap = {NULL};
+	key_snapshot_s snap = {NULL, 0, 0};
 	bundle_foreach(app_control->data, collect_key_cb, &snap);
 	bool go_on = true;
-	char *key;
-	EINA_LIST_FREE(snap.keys, key)
-	{
-		if (go_on && key)
-			go_on = callback(app_control, key, user_data);
-		free(key);
+	for (int i = 0; i < snap.count; i++) {
+		if (go_on)
+			go_on = callback(app_control, snap.keys[i], user_data);
+		free(snap.keys[i]);
 	}
+	free(snap.keys);
 	return APP_CONTROL_ERROR_NONE;
 }
 
@@ -351,8 +363,8 @@ static void add_if_set(bundle *b, const char *key, const char *value)
 		bundle_add_str(b, key, value);
 }
 
-bool app_control_encode_internal(app_control_h app_control, const char *caller, bool reply_requested,
-				 bundle_raw **raw, int *len)
+bool app_control_encode_internal(app_control_h app_control, const char *caller, bool reply_requested, bundle_raw **raw,
+                                 int *len)
 {
 	bundle *b = bundle_dup(app_control->data);
 	if (!b)

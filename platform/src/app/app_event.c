@@ -29,7 +29,7 @@ static bool watching;
 static int applied_rotation;
 
 int ui_app_add_event_handler(app_event_handler_h *event_handler, app_event_type_e event_type, app_event_cb callback,
-			     void *user_data)
+                             void *user_data)
 {
 	if (!event_handler || !callback || event_type < APP_EVENT_LOW_MEMORY ||
 	    event_type > APP_EVENT_SUSPENDED_STATE_CHANGED) {
@@ -39,6 +39,10 @@ int ui_app_add_event_handler(app_event_handler_h *event_handler, app_event_type_
 	struct app_event_handler *h = calloc(1, sizeof(*h));
 	if (!h)
 		return APP_ERROR_OUT_OF_MEMORY;
+	/* Handlers may come before the main loop exists; the list needs Eina. */
+	static bool eina_ready = false;
+	if (!eina_ready)
+		eina_ready = eina_init() > 0;
 	h->type = event_type;
 	h->callback = callback;
 	h->user_data = user_data;
@@ -137,7 +141,10 @@ int app_event_get_suspended_state(app_event_info_h event_info, app_suspended_sta
 
 /* ---- device state ---- */
 
-static bool valid_rotation(int degree) { return degree == 0 || degree == 90 || degree == 180 || degree == 270; }
+static bool valid_rotation(int degree)
+{
+	return degree == 0 || degree == 90 || degree == 180 || degree == 270;
+}
 
 app_device_orientation_e app_get_device_orientation(void)
 {
@@ -225,12 +232,12 @@ static const struct {
 	const char *key;
 	vconf_callback_fn callback;
 } WATCHES[] = {
-	{VCONFKEY_LANGSET, language_changed_cb},
-	{VCONFKEY_REGIONFORMAT, region_changed_cb},
-	{VCONFKEY_REGIONFORMAT_TIME1224, region_changed_cb},
-	{APP_ROTATION_VCONF_KEY, rotation_changed_cb},
-	{VCONFKEY_SYSMAN_LOW_MEMORY, low_memory_cb},
-	{BATTERY_LOW_VCONF_KEY, low_battery_cb},
+    {VCONFKEY_LANGSET, language_changed_cb},
+    {VCONFKEY_REGIONFORMAT, region_changed_cb},
+    {VCONFKEY_REGIONFORMAT_TIME1224, region_changed_cb},
+    {APP_ROTATION_VCONF_KEY, rotation_changed_cb},
+    {VCONFKEY_SYSMAN_LOW_MEMORY, low_memory_cb},
+    {BATTERY_LOW_VCONF_KEY, low_battery_cb},
 };
 
 void app_event_watch_start(void)

@@ -3,6 +3,8 @@
 
 #include "app_private.h"
 
+#include <desktop/app_launch.h>
+
 #include <dlog.h>
 #include <errno.h>
 #include <stdlib.h>
@@ -13,6 +15,8 @@
 
 #define LAUNCH_TIMEOUT_SEC 5.0
 #define LAUNCH_POLL_USEC 20000
+/* How long a sent message may wait for its receiver to take it. */
+#define DELIVERY_TIMEOUT_SEC 5.0
 
 /* A sent request that waits for its reply on its own connection. */
 typedef struct {
@@ -24,6 +28,15 @@ typedef struct {
 } pending_reply_s;
 
 static Eina_List *pending_replies;
+
+/* A connection that carried a message needing no answer. It stays open until the receiver closes
+   it: closing it here first could lose the message on the way. */
+typedef struct {
+	Ecore_Ipc_Server *server;
+	Ecore_Timer *timer;
+} closing_s;
+
+static Eina_List *closing_connections;
 static Ecore_Event_Handler *data_handler;
 static Ecore_Event_Handler *del_handler;
 static int last_ref;
@@ -84,6 +97,17 @@ static void pending_answer(pending_reply_s *p, app_control_h reply, app_control_
 	pending_free(p);
 }
 
+/* The event handlers live only while a connection of ours is open. */
+static void handlers_release_if_idle(void)
+{
+	if (pending_replies || closing_connections || !data_handler)
+		return;
+	ecore_event_handler_del(data_handler);
+	ecore_event_handler_del(del_handler);
+	data_handler = NULL;
+	del_handler = NULL;
+}
+
 static Eina_Bool server_data_cb(void *data, int type, void *event)
 {
 	(void)data;
@@ -102,7 +126,37 @@ static Eina_Bool server_data_cb(void *data, int type, void *event)
 	if (reply)
 		app_control_destroy(reply);
 	server_release_if_unused(server);
+	handlers_release_if_idle();
 	return ECORE_CALLBACK_DONE;
+}
+
+static void closing_free(closing_s *c)
+{
+	closing_connections = eina_list_remove(closing_connections, c);
+	if (c->timer)
+		ecore_timer_del(c->timer);
+	ecore_ipc_server_del(c->server);
+	free(c);
+}
+
+static closing_s *closing_find(Ecore_Ipc_Server *server)
+{
+	Eina_List *l;
+	closing_s *c;
+	EINA_LIST_FOREACH(closing_connections, l, c)
+	if (c->server == server)
+		return c;
+	return NULL;
+}
+
+static Eina_Bool closing_timeout_cb(void *data)
+{
+	closing_s *c = data;
+	c->timer = NULL;
+	LOGE("the receiver did not take a message in time");
+	closing_free(c);
+	handlers_release_if_idle();
+	return ECORE_CALLBACK_CANCEL;
 }
 
 static Eina_Bool server_del_cb(void *data, int type, void *event)
@@ -110,6 +164,12 @@ static Eina_Bool server_del_cb(void *data, int type, void *event)
 	(void)data;
 	(void)type;
 	Ecore_Ipc_Event_Server_Del *ev = event;
+	closing_s *c = closing_find(ev->server);
+	if (c) {
+		closing_free(c);
+		handlers_release_if_idle();
+		return ECORE_CALLBACK_DONE;
+	}
 	pending_reply_s *p;
 	bool ours = false;
 	while ((p = pending_take(ev->server, -1))) {
@@ -120,6 +180,7 @@ static Eina_Bool server_del_cb(void *data, int type, void *event)
 	if (!ours)
 		return ECORE_CALLBACK_PASS_ON;
 	ecore_ipc_server_del(ev->server);
+	handlers_release_if_idle();
 	return ECORE_CALLBACK_DONE;
 }
 
@@ -129,6 +190,37 @@ static void handlers_install(void)
 		return;
 	data_handler = ecore_event_handler_add(ECORE_IPC_EVENT_SERVER_DATA, server_data_cb, NULL);
 	del_handler = ecore_event_handler_add(ECORE_IPC_EVENT_SERVER_DEL, server_del_cb, NULL);
+}
+
+/* Sends one message and leaves the connection to the receiver to close; false if it could not be sent. */
+static bool send_and_release(Ecore_Ipc_Server *server, int major, int ref, const void *data, int size)
+{
+	int sent = ecore_ipc_server_send(server, major, 0, ref, 0, 0, data, size);
+	if (sent <= 0) {
+		ecore_ipc_server_del(server);
+		return false;
+	}
+	ecore_ipc_server_flush(server);
+	closing_s *c = calloc(1, sizeof(*c));
+	if (!c) {
+		ecore_ipc_server_del(server);
+		return true;
+	}
+	handlers_install();
+	c->server = server;
+	c->timer = ecore_timer_add(DELIVERY_TIMEOUT_SEC, closing_timeout_cb, c);
+	closing_connections = eina_list_append(closing_connections, c);
+	return true;
+}
+
+int desktop_app_launch_drain(double timeout_sec)
+{
+	double end = monotonic_now() + timeout_sec;
+	while (closing_connections && monotonic_now() < end) {
+		ecore_main_loop_iterate();
+		usleep(1000);
+	}
+	return closing_connections ? APP_CONTROL_ERROR_TIMED_OUT : APP_CONTROL_ERROR_NONE;
 }
 
 typedef struct {
@@ -196,7 +288,7 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 	char *app_id = target_resolve(app_control);
 	if (!app_id)
 		return launch_error(APP_CONTROL_ERROR_APP_NOT_FOUND, "no registered app takes the operation",
-				    app_control->operation);
+		                    app_control->operation);
 
 	/* A request without operation is a default launch, and says so from now on. */
 	if (!app_control->operation)
@@ -213,13 +305,20 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 			ret = launch_error(APP_CONTROL_ERROR_OUT_OF_MEMORY, "cannot encode the request", app_id);
 	}
 	int ref = ++last_ref;
-	if (ret == APP_CONTROL_ERROR_NONE &&
-	    ecore_ipc_server_send(server, APP_CHANNEL_MSG_LAUNCH, 0, ref, 0, callback ? 1 : 0, raw, len) <= 0)
-		ret = launch_error(APP_CONTROL_ERROR_IO_ERROR, "cannot send the request", app_id);
-
-	if (ret == APP_CONTROL_ERROR_NONE && callback) {
+	if (ret == APP_CONTROL_ERROR_NONE && !callback) {
+		if (!send_and_release(server, APP_CHANNEL_MSG_LAUNCH, ref, raw, len))
+			ret = launch_error(APP_CONTROL_ERROR_IO_ERROR, "cannot send the request", app_id);
+		server = NULL;
+	} else if (ret == APP_CONTROL_ERROR_NONE) {
 		pending_reply_s *p = calloc(1, sizeof(*p));
-		if (p && app_control_clone(&p->request, app_control) == APP_CONTROL_ERROR_NONE) {
+		if (!p || app_control_clone(&p->request, app_control) != APP_CONTROL_ERROR_NONE) {
+			free(p);
+			ret = launch_error(APP_CONTROL_ERROR_OUT_OF_MEMORY, "cannot keep the request", app_id);
+		} else if (ecore_ipc_server_send(server, APP_CHANNEL_MSG_LAUNCH, 0, ref, 0, 1, raw, len) <= 0) {
+			pending_free(p);
+			ret = launch_error(APP_CONTROL_ERROR_IO_ERROR, "cannot send the request", app_id);
+		} else {
+			ecore_ipc_server_flush(server);
 			p->server = server;
 			p->ref = ref;
 			p->callback = callback;
@@ -227,17 +326,13 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 			handlers_install();
 			pending_replies = eina_list_append(pending_replies, p);
 			server = NULL; /* kept until the reply */
-		} else {
-			free(p);
-			ret = launch_error(APP_CONTROL_ERROR_OUT_OF_MEMORY, "cannot keep the request", app_id);
 		}
 	}
-	if (server) {
-		ecore_ipc_server_flush(server);
+	if (server)
 		ecore_ipc_server_del(server);
-	}
 	if (ret == APP_CONTROL_ERROR_NONE)
-		LOGI("launch request sent to %s (%s)", app_id, app_control->operation ? app_control->operation : "no operation");
+		LOGI("launch request sent to %s (%s)", app_id,
+		     app_control->operation ? app_control->operation : "no operation");
 	free(raw);
 	free(caller);
 	free(app_id);
@@ -250,10 +345,7 @@ static int send_simple(const char *app_id, int major)
 	Ecore_Ipc_Server *server = app_channel_connect(app_id);
 	if (!server)
 		return APP_CONTROL_ERROR_APP_NOT_FOUND;
-	int sent = ecore_ipc_server_send(server, major, 0, 0, 0, 0, NULL, 0);
-	ecore_ipc_server_flush(server);
-	ecore_ipc_server_del(server);
-	return sent > 0 ? APP_CONTROL_ERROR_NONE : APP_CONTROL_ERROR_IO_ERROR;
+	return send_and_release(server, major, 0, NULL, 0) ? APP_CONTROL_ERROR_NONE : APP_CONTROL_ERROR_IO_ERROR;
 }
 
 int app_control_send_terminate_request(app_control_h app_control)
@@ -267,7 +359,10 @@ int app_control_send_terminate_request(app_control_h app_control)
 	return APP_CONTROL_ERROR_NONE;
 }
 
-int app_channel_send_resume(const char *app_id) { return send_simple(app_id, APP_CHANNEL_MSG_RESUME); }
+int app_channel_send_resume(const char *app_id)
+{
+	return send_simple(app_id, APP_CHANNEL_MSG_RESUME);
+}
 
 int app_launch_forward(app_control_h request, const char *app_id)
 {
@@ -278,12 +373,12 @@ int app_launch_forward(app_control_h request, const char *app_id)
 	bundle_raw *raw = NULL;
 	int len = 0;
 	int ret = APP_CONTROL_ERROR_NONE;
-	if (!app_control_encode_internal(request, caller, false, &raw, &len))
+	if (!app_control_encode_internal(request, caller, false, &raw, &len)) {
+		ecore_ipc_server_del(server);
 		ret = APP_CONTROL_ERROR_OUT_OF_MEMORY;
-	else if (ecore_ipc_server_send(server, APP_CHANNEL_MSG_LAUNCH, 0, ++last_ref, 0, 0, raw, len) <= 0)
+	} else if (!send_and_release(server, APP_CHANNEL_MSG_LAUNCH, ++last_ref, raw, len)) {
 		ret = APP_CONTROL_ERROR_IO_ERROR;
-	ecore_ipc_server_flush(server);
-	ecore_ipc_server_del(server);
+	}
 	free(raw);
 	free(caller);
 	return ret;

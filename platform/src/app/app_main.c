@@ -4,6 +4,8 @@
 
 #include "app_private.h"
 
+#include <desktop/app_launch.h>
+
 #include <dlog.h>
 #include <stdlib.h>
 #include <string.h>
@@ -176,7 +178,10 @@ static void windows_unhook_all(void)
 
 /* ---- requests ---- */
 
-bool app_main_is_running(void) { return app.running; }
+bool app_main_is_running(void)
+{
+	return app.running;
+}
 
 void app_main_raise(void)
 {
@@ -222,6 +227,8 @@ static bool forward_to_running(const char *app_id)
 	int ret = app_launch_forward(app.argv_request, app_id);
 	if (ret != APP_CONTROL_ERROR_NONE)
 		return false;
+	if (desktop_app_launch_drain(FIRST_REQUEST_WAIT_SEC) != APP_CONTROL_ERROR_NONE)
+		LOGE("%s did not take the request in time", app_id);
 	LOGI("%s is running already: request handed over", app_id);
 	return true;
 }

@@ -216,19 +216,40 @@ static char *app_sub_path_get(const char *sub)
 	return path;
 }
 
-char *app_get_data_path(void) { return app_sub_path_get("data"); }
+char *app_get_data_path(void)
+{
+	return app_sub_path_get("data");
+}
 
-char *app_get_cache_path(void) { return app_sub_path_get("cache"); }
+char *app_get_cache_path(void)
+{
+	return app_sub_path_get("cache");
+}
 
-char *app_get_shared_data_path(void) { return app_sub_path_get("shared/data"); }
+char *app_get_shared_data_path(void)
+{
+	return app_sub_path_get("shared/data");
+}
 
-char *app_get_shared_trusted_path(void) { return app_sub_path_get("shared/trusted"); }
+char *app_get_shared_trusted_path(void)
+{
+	return app_sub_path_get("shared/trusted");
+}
 
-char *app_get_external_data_path(void) { return app_sub_path_get("external/data"); }
+char *app_get_external_data_path(void)
+{
+	return app_sub_path_get("external/data");
+}
 
-char *app_get_external_cache_path(void) { return app_sub_path_get("external/cache"); }
+char *app_get_external_cache_path(void)
+{
+	return app_sub_path_get("external/cache");
+}
 
-char *app_get_external_shared_data_path(void) { return app_sub_path_get("external/shared/data"); }
+char *app_get_external_shared_data_path(void)
+{
+	return app_sub_path_get("external/shared/data");
+}
 
 /* Read-only folders beside the executable: <exe dir>/../<sub>/ */
 static char *install_path_get(const char *sub)
@@ -250,7 +271,10 @@ char *app_get_resource_path(void)
 	return install_path_get("res");
 }
 
-char *app_get_shared_resource_path(void) { return install_path_get("shared/res"); }
+char *app_get_shared_resource_path(void)
+{
+	return install_path_get("shared/res");
+}
 
 int app_get_id(char **id)
 {

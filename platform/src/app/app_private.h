@@ -68,8 +68,8 @@ struct app_control_s {
 };
 
 /* Serialises every field and the extra data into one bundle text (malloc'ed, caller frees). */
-bool app_control_encode_internal(app_control_h app_control, const char *caller, bool reply_requested,
-				 bundle_raw **raw, int *len);
+bool app_control_encode_internal(app_control_h app_control, const char *caller, bool reply_requested, bundle_raw **raw,
+                                 int *len);
 /* Rebuilds a handle (with caller and reply flag) from app_control_encode_internal's text; NULL if malformed. */
 app_control_h app_control_decode_internal(const bundle_raw *raw, int len);
 /* True for keys the platform keeps for itself. */
@@ -87,6 +87,8 @@ enum {
 
 /* Socket name of an app's launch channel (malloc'ed). */
 char *app_channel_name_get(const char *app_id);
+/* Removes the socket file of the channel name when nobody listens on it any more. */
+void app_channel_stale_remove(const char *name);
 /* A connection to the running app, or NULL when it is not running. */
 Ecore_Ipc_Server *app_channel_connect(const char *app_id);
 /* True when an app with this id answers on its launch socket. */

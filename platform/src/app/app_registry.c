@@ -148,12 +148,33 @@ static bool has_ini_suffix(const char *name)
 	return n > 4 && !strcmp(name + n - 4, ".ini");
 }
 
+/* Ids met so far in a registry walk. */
+typedef struct {
+	char **ids;
+	size_t count;
+} seen_ids_s;
+
+static bool seen_add(seen_ids_s *seen, const char *id)
+{
+	for (size_t i = 0; i < seen->count; i++)
+		if (!strcmp(seen->ids[i], id))
+			return false;
+	char **ids = realloc(seen->ids, (seen->count + 1) * sizeof(char *));
+	if (!ids)
+		return false;
+	seen->ids = ids;
+	seen->ids[seen->count] = strdup(id);
+	if (seen->ids[seen->count])
+		seen->count++;
+	return true;
+}
+
 void app_registry_foreach(bool (*cb)(const app_registry_entry_s *entry, void *data), void *data)
 {
 	if (!cb)
 		return;
 	char **dirs = registry_dirs_get();
-	Eina_List *seen = NULL;
+	seen_ids_s seen = {NULL, 0};
 	bool go_on = true;
 	for (size_t i = 0; go_on && dirs && dirs[i]; i++) {
 		DIR *d = opendir(dirs[i]);
@@ -166,19 +187,15 @@ void app_registry_foreach(bool (*cb)(const app_registry_entry_s *entry, void *da
 			char path[PATH_MAX];
 			snprintf(path, sizeof(path), "%s/%s", dirs[i], de->d_name);
 			app_registry_entry_s *e = entry_load(path);
-			if (!e)
-				continue;
-			if (!eina_list_search_unsorted(seen, (Eina_Compare_Cb)strcmp, e->id)) {
-				seen = eina_list_append(seen, strdup(e->id));
+			if (e && seen_add(&seen, e->id))
 				go_on = cb(e, data);
-			}
 			app_registry_entry_free(e);
 		}
 		closedir(d);
 	}
-	char *id;
-	EINA_LIST_FREE(seen, id)
-	free(id);
+	for (size_t i = 0; i < seen.count; i++)
+		free(seen.ids[i]);
+	free(seen.ids);
 	registry_dirs_free(dirs);
 }
 

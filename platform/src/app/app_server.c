@@ -41,6 +41,9 @@ static void on_launch(Ecore_Ipc_Event_Client_Data *ev)
 	}
 	request->reply_token = ++last_token;
 	request->reply_requested = ev->response == 1;
+	/* The sender waits for us to close a connection that needs no answer. */
+	if (!request->reply_requested)
+		ecore_ipc_client_del(ev->client);
 	if (request->reply_requested) {
 		waiting_sender_s *w = calloc(1, sizeof(*w));
 		if (w) {
@@ -68,10 +71,12 @@ static Eina_Bool client_data_cb(void *data, int type, void *event)
 		on_launch(ev);
 		break;
 	case APP_CHANNEL_MSG_TERMINATE:
+		ecore_ipc_client_del(ev->client);
 		LOGI("asked to end");
 		ui_app_exit();
 		break;
 	case APP_CHANNEL_MSG_RESUME:
+		ecore_ipc_client_del(ev->client);
 		app_main_raise();
 		break;
 	default:
@@ -154,6 +159,8 @@ bool app_server_start(const char *app_id)
 		return true;
 	ecore_ipc_init();
 	char *name = app_channel_name_get(app_id);
+	if (name)
+		app_channel_stale_remove(name);
 	server = name ? server_add_quiet(name) : NULL;
 	free(name);
 	if (!server) {

@@ -11,9 +11,9 @@
 struct keyval_t {
 	char *key;
 	int type;
-	unsigned int count;    /* number of elements (1 for scalars) */
-	void **values;         /* each element, NUL-terminated for strings */
-	size_t *sizes;         /* byte size of each element (strings include the NUL) */
+	unsigned int count; /* number of elements (1 for scalars) */
+	void **values;      /* each element, NUL-terminated for strings */
+	size_t *sizes;      /* byte size of each element (strings include the NUL) */
 };
 
 struct _bundle_t {
@@ -36,7 +36,7 @@ static void keyval_free(struct keyval_t *kv)
 
 /* A new keyval holding copies of count elements; NULL on allocation failure. */
 static struct keyval_t *keyval_new(const char *key, int type, unsigned int count, const void *const *values,
-				   const size_t *sizes)
+                                   const size_t *sizes)
 {
 	struct keyval_t *kv = calloc(1, sizeof(*kv));
 	if (!kv)
@@ -100,7 +100,7 @@ static int append(bundle *b, struct keyval_t *kv)
 
 /* Common checks and insertion of every adder. */
 static int add_values(bundle *b, const char *key, int type, unsigned int count, const void *const *values,
-		      const size_t *sizes)
+                      const size_t *sizes)
 {
 	if (!b || !key || !*key)
 		return BUNDLE_ERROR_INVALID_PARAMETER;
@@ -109,7 +109,10 @@ static int add_values(bundle *b, const char *key, int type, unsigned int count, 
 	return append(b, keyval_new(key, type, count, values, sizes));
 }
 
-bundle *bundle_create(void) { return calloc(1, sizeof(bundle)); }
+bundle *bundle_create(void)
+{
+	return calloc(1, sizeof(bundle));
+}
 
 int bundle_free(bundle *b)
 {
@@ -139,7 +142,10 @@ bundle *bundle_dup(bundle *b_from)
 	return b;
 }
 
-int bundle_get_count(bundle *b) { return b ? b->count : 0; }
+int bundle_get_count(bundle *b)
+{
+	return b ? b->count : 0;
+}
 
 int bundle_get_type(bundle *b, const char *key)
 {
@@ -171,7 +177,10 @@ int bundle_add_str(bundle *b, const char *key, const char *str)
 	return add_values(b, key, BUNDLE_TYPE_STR, 1, values, sizes);
 }
 
-int bundle_add(bundle *b, const char *key, const char *val) { return bundle_add_str(b, key, val); }
+int bundle_add(bundle *b, const char *key, const char *val)
+{
+	return bundle_add_str(b, key, val);
+}
 
 int bundle_add_str_array(bundle *b, const char *key, const char **str_array, const int len)
 {
@@ -269,7 +278,10 @@ void bundle_foreach(bundle *b, bundle_iterator_t iter, void *user_data)
 		iter(b->items[i]->key, b->items[i]->type, b->items[i], user_data);
 }
 
-int bundle_keyval_get_type(bundle_keyval_t *kv) { return kv ? kv->type : BUNDLE_TYPE_NONE; }
+int bundle_keyval_get_type(bundle_keyval_t *kv)
+{
+	return kv ? kv->type : BUNDLE_TYPE_NONE;
+}
 
 int bundle_keyval_type_is_array(bundle_keyval_t *kv)
 {
@@ -289,7 +301,7 @@ int bundle_keyval_get_basic_val(bundle_keyval_t *kv, void **val, size_t *size)
 }
 
 int bundle_keyval_get_array_val(bundle_keyval_t *kv, void ***array_val, unsigned int *array_len,
-				size_t **array_element_size)
+                                size_t **array_element_size)
 {
 	if (!kv || !array_val || !(kv->type & BUNDLE_TYPE_ARRAY))
 		return BUNDLE_ERROR_INVALID_PARAMETER;

@@ -4,7 +4,10 @@
 #include <stdlib.h>
 #include <string.h>
 
-void bundle_writer_init(bundle_writer_s *w) { memset(w, 0, sizeof(*w)); }
+void bundle_writer_init(bundle_writer_s *w)
+{
+	memset(w, 0, sizeof(*w));
+}
 
 static void writer_put(bundle_writer_s *w, const void *bytes, size_t len)
 {
@@ -30,7 +33,7 @@ static void writer_put(bundle_writer_s *w, const void *bytes, size_t len)
 void bundle_writer_u32(bundle_writer_s *w, uint32_t v)
 {
 	unsigned char b[4] = {(unsigned char)v, (unsigned char)(v >> 8), (unsigned char)(v >> 16),
-			      (unsigned char)(v >> 24)};
+	                      (unsigned char)(v >> 24)};
 	writer_put(w, b, 4);
 }
 

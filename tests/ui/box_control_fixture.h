@@ -1,0 +1,127 @@
+#ifndef TESTS_UI_BOX_CONTROL_FIXTURE_H
+#define TESTS_UI_BOX_CONTROL_FIXTURE_H
+
+// A real box control in the test window's scroller, with every key it signals recorded.
+
+#include <Ecore_File.h>
+
+#include <cstring>
+#include <string>
+#include <vector>
+
+#include "Box/MemoBoxControl.h"
+#include "Box/MemoBoxItem.h"
+#include "DataBase/MemoDocInfo.h"
+#include "Util/MemoUtil.h"
+#include "support/UiTestSupport.h"
+
+namespace memo_ui_test
+{
+
+class BoxControlFixture : public UiFixture
+{
+protected:
+	void SetUp() override
+	{
+		// As the app sets it: layout sizes are given for a scale of 2.6.
+		elm_app_base_scale_set(2.6);
+		UiFixture::SetUp();
+	}
+
+	void TearDown() override
+	{
+		// The control goes with the window.
+		UiFixture::TearDown();
+		control = nullptr;
+		elm_config_scale_set(1.0);
+	}
+
+	// Builds a control for `doc` (may be null) in `mode`; it replaces the fixture's own box.
+	MemoBoxControl *makeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
+	{
+		control = new MemoBoxControl(doc, mode, uuid);
+		EXPECT_TRUE(control->create(scroller, nullptr));
+		box = nullptr;
+		control->getSignal().addListener([this](const char *key, void *payload) {
+			keys.push_back(key);
+			payloads.push_back(payload && strcmp(key, "action,image,selected") == 0 ? static_cast<char *>(payload)
+																					  : "");
+		});
+		render();
+		runFor(0.05);
+		return control;
+	}
+
+	std::vector<MemoBoxItem *> items() const
+	{
+		std::vector<MemoBoxItem *> result;
+		const Eina_List *l = nullptr;
+		void *data = nullptr;
+		EINA_LIST_FOREACH(control->getItemList(), l, data)
+		result.push_back(static_cast<MemoBoxItem *>(data));
+		return result;
+	}
+
+	// The item layouts in the order the box shows them.
+	std::vector<Evas_Object *> packed() const
+	{
+		std::vector<Evas_Object *> result;
+		Eina_List *children = elm_box_children_get(control->getEvasObj());
+		void *data = nullptr;
+		EINA_LIST_FREE(children, data)
+		result.push_back(static_cast<Evas_Object *>(data));
+		return result;
+	}
+
+	static std::string text(MemoBoxItem *item)
+	{
+		const char *t = item && item->getEntry() ? elm_entry_entry_get(item->getEntry()) : nullptr;
+		return t ? t : "";
+	}
+
+	static std::string document(MemoBoxControl *from)
+	{
+		char *xml = from->getTodoListXmlN();
+		std::string result = xml ? xml : "<null>";
+		free(xml);
+		return result;
+	}
+
+	int countKey(const char *key) const
+	{
+		int n = 0;
+		for (const std::string &k : keys)
+			n += k == key ? 1 : 0;
+		return n;
+	}
+
+	std::string lastKey() const { return keys.empty() ? "" : keys.back(); }
+
+	// The memo's media folder, made.
+	static std::string mediaDir(const char *uuid = "box-test-memo")
+	{
+		const std::string dir = std::string(MemoUtil::getDataPath()) + "media/" + uuid + "/";
+		ecore_file_mkpath(dir.c_str());
+		return dir;
+	}
+
+	MemoBoxControl *control = nullptr;
+	std::vector<std::string> keys;
+	std::vector<std::string> payloads;
+};
+
+// One todolist line as the store keeps it.
+inline std::string todoItem(int type, bool state, const std::string &escapedContent)
+{
+	return std::string("<todolist_item todo_item_type=\"") + std::to_string(type) + "\" todo_item_state=\"" +
+		   (state ? "true" : "false") + "\" todo_item_content=\"" + escapedContent + "\"/>\n";
+}
+
+inline std::string todoList(const std::string &lines)
+{
+	return "<todolist>\n" + lines + "</todolist>\n";
+}
+
+} // namespace memo_ui_test
+
+#endif

@@ -1,0 +1,76 @@
+// Image sizes, tags and tag scanning of the box items, without widgets.
+#include <gtest/gtest.h>
+
+#include "Box/MemoBoxImageMarkup.h"
+#include "Box/MemoBoxImageSize.h"
+
+TEST(BoxImageSize, WidthsFollowTheExactScale)
+{
+	int w = 0, h = 0;
+	memoBoxImageTextSize(1.8, &w, &h);
+	EXPECT_EQ(603, w);
+	EXPECT_EQ(428, h);
+	memoBoxImageTextSize(3.8, &w, &h);
+	EXPECT_EQ(653, w);
+	memoBoxImageTextSize(1.81, &w, &h);
+	EXPECT_EQ(628, w);
+	memoBoxImageCheckSize(1.8, &w, &h);
+	EXPECT_EQ(506, w);
+	EXPECT_EQ(392, h);
+	memoBoxImageCheckSize(3.8, &w, &h);
+	EXPECT_EQ(560, w);
+	memoBoxImageCheckSize(2.6, &w, &h);
+	EXPECT_EQ(521, w);
+}
+
+TEST(BoxImageSize, HeightKeepsTheProportionsPlusRoom)
+{
+	EXPECT_EQ(341, memoBoxImageTagHeight(1000, 500, 603, 428));
+	EXPECT_EQ(293, memoBoxImageTagHeight(1000, 500, 506, 392));
+	// Large pictures do not overflow the arithmetic.
+	EXPECT_EQ(603 * 3 / 4 + 40, memoBoxImageTagHeight(40000, 30000, 603, 428));
+	EXPECT_EQ(428, memoBoxImageTagHeight(0, 500, 603, 428));
+	EXPECT_EQ(428, memoBoxImageTagHeight(1000, -1, 603, 428));
+}
+
+TEST(BoxImageSize, TagTemplates)
+{
+	EXPECT_EQ("<item size=603x341 vsize=full href=file:///m/a.jpg></item><br/>",
+			  memoBoxImageTag(603, 341, "/m/a.jpg", false));
+	EXPECT_EQ("<br/><item size=603x341 vsize=full href=file:///m/a.jpg></item><br/>",
+			  memoBoxImageTag(603, 341, "/m/a.jpg", true));
+	EXPECT_EQ(2047u, memoBoxImageTag(1, 1, std::string(3000, 'p').c_str(), false).size());
+}
+
+TEST(BoxImageMarkup, PathsInOrder)
+{
+	const std::string markup = "a<br/><item size=603x341 vsize=full href=file:///m/one.jpg></item><br/>"
+							   "b<item size=1x1 href=file:///m/two.png></item>"
+							   "<item size=1x1 href=file:///m/open.png>";
+	const std::vector<std::string> paths = memoBoxImagePaths(markup.c_str());
+	ASSERT_EQ(2u, paths.size());
+	EXPECT_EQ("/m/one.jpg", paths[0]);
+	EXPECT_EQ("/m/two.png", paths[1]);
+	EXPECT_TRUE(memoBoxImagePaths(nullptr).empty());
+	EXPECT_TRUE(memoBoxImagePaths("plain<br/>text").empty());
+
+	const std::string longTag = "<item size=1x1 href=file://" + std::string(2000, 'x') + "></item>";
+	ASSERT_EQ(1u, memoBoxImagePaths(longTag.c_str()).size());
+	EXPECT_EQ(1023u, memoBoxImagePaths(longTag.c_str())[0].size());
+}
+
+TEST(BoxImageMarkup, ErasingATag)
+{
+	const std::string one = "<item size=603x341 vsize=full href=file:///m/one.jpg></item>";
+	const std::string two = "<item size=603x341 vsize=full href=file:///m/two.jpg></item>";
+	std::string markup = "x" + one + "<br/>y" + two + "<br/>";
+	EXPECT_TRUE(memoBoxImageEraseByPath(markup, "/m/two.jpg"));
+	EXPECT_EQ("x" + one + "<br/>y<br/>", markup);
+	EXPECT_FALSE(memoBoxImageEraseByPath(markup, "/m/two.jpg"));
+	EXPECT_FALSE(memoBoxImageEraseByPath(markup, nullptr));
+
+	// Deleting from outside names the file by its UUID only.
+	EXPECT_TRUE(memoBoxImageEraseTag(markup, "one"));
+	EXPECT_EQ("x<br/>y<br/>", markup);
+	EXPECT_FALSE(memoBoxImageEraseTag(markup, "one"));
+}

@@ -1,0 +1,75 @@
+#ifndef TESTS_UI_SUPPORT_UITESTSUPPORT_H
+#define TESTS_UI_SUPPORT_UITESTSUPPORT_H
+
+// Scaffolding of the in-process UI tests: Elementary on the buffer engine with the app's theme, a
+// window holding a scroller and a vertical box, and real key and pointer events fed to its canvas.
+
+#include <functional>
+#include <string>
+
+#include <Elementary.h>
+#include <gtest/gtest.h>
+
+namespace memo_ui_test
+{
+
+// Elementary and the app's theme, once per process. Safe to call again.
+void initUi();
+
+// A window of 720 x 1280 with a background, a scroller and a vertical box (`box`) in it.
+class UiFixture : public ::testing::Test
+{
+protected:
+	void SetUp() override;
+	void TearDown() override;
+
+	Evas *evas() const;
+
+	// Lets the canvas compute its layout (smart calculation and a render), so geometries are real.
+	void render();
+	// Runs the main loop, idlers, timers and thread ends included, until pred() holds or timeoutSec
+	// passes; returns pred().
+	bool waitFor(const std::function<bool()> &pred, double timeoutSec = 3.0);
+	// Runs the main loop for the given time.
+	void runFor(double seconds);
+
+	// One key press and release (`string` is what the key types, null for none), then the handlers run.
+	void pressKey(const char *keyName, const char *string = nullptr);
+	// Types UTF-8 text one character per key press (ASCII letters, digits, blanks and punctuation).
+	void typeText(const char *text);
+
+	// Pointer events at canvas coordinates; each lets the handlers run.
+	void mouseDown(int x, int y);
+	void mouseMove(int x, int y);
+	void mouseUp(int x, int y);
+	// Down and up at one point.
+	void tap(int x, int y);
+	// The centre of an object's geometry, after a render.
+	void centreOf(Evas_Object *obj, int *x, int *y);
+
+	// Focuses the widget and gives the canvas the keyboard.
+	void focus(Evas_Object *widget);
+
+	// Saves the window as PNG.
+	bool screenshot(const std::string &pngPath);
+
+	Evas_Object *win = nullptr;
+	Evas_Object *scroller = nullptr;
+	Evas_Object *box = nullptr;
+
+private:
+	unsigned int __timestamp = 1000;
+};
+
+// Writes a picture of w x h to `path` in the format of its extension (.jpg, .png), a soft gradient with
+// a dark frame, through a throw-away buffer canvas. False when Evas cannot save it.
+bool writePicture(const std::string &path, int w, int h);
+
+// The messages posted as toasts since the last clearToasts().
+int toastCount();
+std::string toastAt(int index);
+void clearToasts();
+
+} // namespace memo_ui_test
+
+#endif
