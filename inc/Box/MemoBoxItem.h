@@ -130,13 +130,16 @@ private:
 
 	// Entry filter (MemoEntryFilter*.cpp).
 	static void __entryFilter(void *data, Evas_Object *entry, char **text);
-	void __adoptFixedSizeTags(std::string &text, std::vector<std::string> &queue);
+	struct __ResizeRequest;
+	struct __ResizeJob;
+	void __adoptFixedSizeTags(std::string &text, std::vector<__ResizeRequest> &queue);
 	void __adoptImageTags(std::string &text);
+	std::string __mediaFolderNameFor(const std::string &path);
 	std::string __copyIntoMediaFolder(const std::string &path);
 	void __getDisplayWidth(int *width, int *defaultHeight);
-	struct __ResizeJob;
-	void __queueResizeWorkers(const std::vector<std::string> &paths);
-	__ResizeJob *__startResizeWorker(bool insertsPendingText);
+	void __queueResizeWorkers(const std::vector<__ResizeRequest> &requests);
+	// Starts a worker that shrinks `source` into __resizePath with the __resize* fields.
+	__ResizeJob *__startResizeWorker(const std::string &source, bool insertsPendingText);
 	void __forgetResizeJob(__ResizeJob *job);
 	void __detachResizeJobs();
 	static void __resizeWorkerCb(void *data, Ecore_Thread *thread);

@@ -244,7 +244,7 @@ int main(int argc, char **argv)
 		case 't': {
 			char *end = NULL;
 			timeout = strtod(optarg, &end);
-			if (!end || *end || timeout <= 0) {
+			if (!end || end == optarg || *end || !(timeout > 0)) {
 				fprintf(stderr, "app_launcher: bad timeout \"%s\"\n", optarg);
 				exit_code = EXIT_USAGE;
 			}
@@ -282,6 +282,7 @@ int main(int argc, char **argv)
 		else if (app_id)
 			exit_code = send_request(request, app_id, want_reply, timeout);
 		else {
+			fprintf(stderr, "app_launcher: name the app with -s <appid> (or use -k or -l)\n");
 			usage(stderr);
 			exit_code = EXIT_USAGE;
 		}

@@ -17,7 +17,7 @@ MemoBoxItem::MemoBoxItem(_MemoBoxItemType type, const char *memoUuid, bool isEdi
       __type(type), __listener(nullptr), __isEditable(isEditable), __imgPathList(nullptr), __imgObjList(nullptr),
       __limit(), __pressX(0), __pressY(0), __ignoreMouseUp(false), __longPressed(false), __resizeWidth(0),
       __resizeHeight(0), __resizeRatio(1.0f), __pendingThreads(0), __lastCursorPos(0),
-      __memoUuid(memoUuid ? memoUuid : ""), __threadHandle(nullptr)
+      __memoUuid(memoUuid ? memoUuid : ""), __threadHandle(nullptr), __busListenerId(0)
 {
 	__limit.max_char_count = MEMO_BOX_BODY_CHAR_LIMIT;
 	__limit.max_byte_count = 0;

@@ -107,12 +107,10 @@ void MemoBoxItem::__onEntryMouseUpCb(void *data, Evas *e, Evas_Object *obj, void
 	if (self->__listener)
 		self->__listener->suspendKeypad();
 	// The path is copied: the image object that holds it may go before the idler runs.
-	std::string *selected = new std::string(path);
-	self->__addIdler([selected](void *idlerData) {
+	self->__addIdler([selected = std::string(path)](void *idlerData) {
 		MemoBoxItem *item = static_cast<MemoBoxItem *>(idlerData);
 		if (item->__listener)
-			item->__listener->onImageSelected(selected->c_str());
-		delete selected;
+			item->__listener->onImageSelected(selected.c_str());
 		return false;
 	});
 }

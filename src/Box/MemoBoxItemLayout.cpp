@@ -39,6 +39,26 @@ Evas_Coord scaled(int size)
 {
 	return static_cast<Evas_Coord>(size * elm_config_scale_get() / elm_app_base_scale_get());
 }
+
+// Text sizes of the editor at the Elementary scale 1.0, like the theme's other sizes: the toolkit's
+// entry is sized for dialogs, a memo is read like a page.
+const Evas_Font_Size BODY_TEXT_SIZE = 26;
+const Evas_Font_Size TITLE_TEXT_SIZE = 34;
+
+// The entry's text classes, set on this entry's theme objects only (a scrolling field keeps its text in
+// an inner one); the font stays the theme's.
+void setEntryTextSize(Evas_Object *obj, Evas_Font_Size size)
+{
+	const char *type = evas_object_type_get(obj);
+	if (type && !strcmp(type, "edje")) {
+		edje_object_text_class_set(obj, "entry_text", nullptr, size);
+		edje_object_text_class_set(obj, "entry_guide_text", nullptr, size);
+	}
+	Eina_List *members = evas_object_smart_members_get(obj);
+	void *member = nullptr;
+	EINA_LIST_FREE(members, member)
+	setEntryTextSize(static_cast<Evas_Object *>(member), size);
+}
 } // namespace
 
 void MemoBoxItem::__createTitleLayout()
@@ -71,6 +91,7 @@ void MemoBoxItem::__createTitleLayout()
 		elm_entry_input_panel_return_key_type_set(entry, ELM_INPUT_PANEL_RETURN_KEY_TYPE_NEXT);
 		// The title sits on the page itself: no field background, bold dark text.
 		clearFieldBackground(entry);
+		setEntryTextSize(entry, TITLE_TEXT_SIZE);
 		elm_entry_text_style_user_push(entry, MEMO_BOX_TEXT_STYLE_TITLE);
 		__entryObj = entry;
 	}
@@ -139,6 +160,7 @@ void MemoBoxItem::__createInnerLayout()
 
 	Evas_Object *entry = elm_entry_add(layout);
 	elm_entry_cnp_mode_set(entry, ELM_CNP_MODE_MARKUP);
+	setEntryTextSize(entry, BODY_TEXT_SIZE);
 	__entryObj = entry;
 
 	if (__type == MEMO_BOX_ITEM_FIRST_TEXT && __listener)

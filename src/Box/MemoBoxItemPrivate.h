@@ -26,10 +26,22 @@ const int MEMO_BOX_TAP_MOVE_LIMIT = 20;
 
 #define MEMO_BOX_LINE_BREAK "<br/>"
 
+// A picture of a paste that must be shrunk before the insertion: read from `source`, written to `target`
+// in the memo's folder at width x height (`ratio` is the scale that gives them).
+struct MemoBoxItem::__ResizeRequest {
+	std::string source;
+	std::string target;
+	int width;
+	int height;
+	float ratio;
+};
+
 // One picture to shrink on a worker. The worker reads only its own copy of the parameters; `item` is
 // cleared by the item's destructor so that an end callback after it finds nobody to tell.
 struct MemoBoxItem::__ResizeJob {
 	MemoBoxItem *item;
+	// The picture read, and the file written (the same file when a copy is shrunk in place).
+	std::string source;
 	std::string path;
 	int width;
 	int height;

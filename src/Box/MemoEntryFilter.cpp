@@ -178,7 +178,7 @@ void MemoBoxItem::__entryFilter(void *data, Evas_Object *entry, char **text)
 	if (work.find("<item") != std::string::npos)
 		limitImageCount(work, self->__listener ? self->__listener->onEntryCheckImageCount() : -1);
 
-	std::vector<std::string> queue;
+	std::vector<__ResizeRequest> queue;
 	self->__adoptFixedSizeTags(work, queue);
 	self->__adoptImageTags(work);
 

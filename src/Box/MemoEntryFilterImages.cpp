@@ -4,7 +4,11 @@
 
 #include <Ecore_File.h>
 
+#include <fcntl.h>
+#include <unistd.h>
+
 #include <algorithm>
+#include <cerrno>
 #include <cstdio>
 #include <cstring>
 
@@ -28,6 +32,65 @@ std::string buildTag(int width, int height, const std::string &path)
 bool isJpeg(const std::string &path)
 {
 	return eina_str_has_extension(path.c_str(), ".jpg") || eina_str_has_extension(path.c_str(), ".jpeg");
+}
+
+// Copies a file with the kernel doing the work: a camera picture is several megabytes, and a copy through
+// user space buffers would hold the main loop for a whole frame. False (and no target) on failure.
+bool copyFile(const std::string &from, const std::string &to)
+{
+	const int in = open(from.c_str(), O_RDONLY | O_CLOEXEC);
+	if (in < 0)
+		return false;
+	const int out = open(to.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
+	if (out < 0) {
+		close(in);
+		return false;
+	}
+	bool ok = true;
+	bool kernelCopy = true;
+	for (;;) {
+		ssize_t n = -1;
+		if (kernelCopy) {
+			n = copy_file_range(in, nullptr, out, nullptr, 1 << 30, 0);
+			if (n < 0 && (errno == EXDEV || errno == ENOSYS || errno == EINVAL || errno == EOPNOTSUPP)) {
+				kernelCopy = false;
+				continue;
+			}
+		} else {
+			char buffer[1 << 16];
+			n = read(in, buffer, sizeof(buffer));
+			for (ssize_t done = 0; n > 0 && done < n;) {
+				const ssize_t written = write(out, buffer + done, n - done);
+				if (written < 0 && errno != EINTR) {
+					n = -1;
+					break;
+				}
+				done += written > 0 ? written : 0;
+			}
+		}
+		if (n < 0 && errno == EINTR)
+			continue;
+		if (n <= 0) {
+			ok = n == 0;
+			break;
+		}
+	}
+	close(in);
+	if (close(out) != 0)
+		ok = false;
+	if (!ok)
+		unlink(to.c_str());
+	return ok;
+}
+
+// Where a worker writes the shrunk picture before it replaces the target: beside it, hidden, with the same
+// extension (the Evas savers choose the format by it). The rename swaps the file at once, so the entry
+// never finds it half written or missing.
+std::string workFileFor(const std::string &target)
+{
+	const size_t slash = target.rfind('/');
+	const size_t nameAt = slash == std::string::npos ? 0 : slash + 1;
+	return target.substr(0, nameAt) + ".resizing-" + target.substr(nameAt);
 }
 } // namespace
 
@@ -83,8 +146,8 @@ void MemoBoxItem::__getDisplayWidth(int *width, int *defaultHeight)
 		__getImgSizeTextType(width, defaultHeight);
 }
 
-// A copy of the picture under a new name in <data>media/<uuid>/, keeping the extension; "" on failure.
-std::string MemoBoxItem::__copyIntoMediaFolder(const std::string &path)
+// A new name for the picture in <data>media/<uuid>/, keeping its extension; "" when the folder cannot be made.
+std::string MemoBoxItem::__mediaFolderNameFor(const std::string &path)
 {
 	const std::string folder = std::string(MemoUtil::getDataPath()) + "media/" + __memoUuid + "/";
 	if (!ecore_file_is_dir(folder.c_str()) && !ecore_file_mkpath(folder.c_str())) {
@@ -98,15 +161,26 @@ std::string MemoBoxItem::__copyIntoMediaFolder(const std::string &path)
 	const char *dot = name ? strrchr(name, '.') : nullptr;
 	std::string target = folder + uuid + (dot ? dot : "");
 	free(uuid);
-	if (!ecore_file_cp(path.c_str(), target.c_str())) {
+	return target;
+}
+
+// A copy of the picture under a new name in the memo's media folder; "" on failure.
+std::string MemoBoxItem::__copyIntoMediaFolder(const std::string &path)
+{
+	const std::string target = __mediaFolderNameFor(path);
+	if (target.empty())
+		return "";
+	if (!copyFile(path, target)) {
 		MEMO_LOGE("Copy failed: %s", path.c_str());
 		return "";
 	}
 	return target;
 }
 
-// Step 8: tags of the fixed paste size get this display's size and a copy of their file.
-void MemoBoxItem::__adoptFixedSizeTags(std::string &text, std::vector<std::string> &queue)
+// Step 8: tags of the fixed paste size get this display's size and a file of their own in the memo's
+// folder. A picture that needs shrinking is not copied here: its worker writes the shrunk file straight
+// into the folder, and the insertion waits for it anyway.
+void MemoBoxItem::__adoptFixedSizeTags(std::string &text, std::vector<__ResizeRequest> &queue)
 {
 	size_t pos = 0;
 	while ((pos = text.find(FIXED_SIZE_TAG, pos)) != std::string::npos) {
@@ -116,18 +190,23 @@ void MemoBoxItem::__adoptFixedSizeTags(std::string &text, std::vector<std::strin
 			pos = end;
 			continue;
 		}
-		std::string target = __copyIntoMediaFolder(path);
+		__ResizeRequest request = {path, "", 0, 0, 1.0f};
+		int error = 0;
+		const bool needsResize =
+		    MemoUtil::getInsertImageSize(path.c_str(), &request.width, &request.height, &error, &request.ratio);
+		std::string target = needsResize ? __mediaFolderNameFor(path) : __copyIntoMediaFolder(path);
 		if (target.empty())
 			target = path;
 		int width = 0, height = 0;
-		__getImgDisplaySize(target.c_str(), &width, &height);
+		__getImgDisplaySize(path.c_str(), &width, &height);
 		const std::string tag = buildTag(width, height, target);
 		text.replace(pos, end - pos, tag);
 		pos += tag.size();
 
-		int resizeWidth = 0, resizeHeight = 0, error = 0;
-		if (MemoUtil::getInsertImageSize(target.c_str(), &resizeWidth, &resizeHeight, &error))
-			queue.push_back(target);
+		if (needsResize) {
+			request.target = target;
+			queue.push_back(request);
+		}
 	}
 }
 
@@ -161,7 +240,7 @@ void MemoBoxItem::__adoptImageTags(std::string &text)
 					__resizeWidth = resizeWidth;
 					__resizeHeight = resizeHeight;
 					__resizeRatio = ratio;
-					__startResizeWorker(false);
+					__startResizeWorker(target, false);
 				}
 			}
 		}
@@ -171,24 +250,25 @@ void MemoBoxItem::__adoptImageTags(std::string &text)
 }
 
 // Step 10 with a queue: the text waits in __pendingText until the last worker has ended.
-void MemoBoxItem::__queueResizeWorkers(const std::vector<std::string> &paths)
+void MemoBoxItem::__queueResizeWorkers(const std::vector<__ResizeRequest> &requests)
 {
 	if (__listener)
 		__listener->onImagePopupRequested(true);
 	// Counted before any worker starts, so that a worker that ends at once cannot find the count at 0.
-	__pendingThreads += static_cast<int>(paths.size());
-	for (const std::string &path : paths) {
-		int error = 0;
-		__resizePath = path;
-		MemoUtil::getInsertImageSize(path.c_str(), &__resizeWidth, &__resizeHeight, &error, &__resizeRatio);
-		__startResizeWorker(true);
+	__pendingThreads += static_cast<int>(requests.size());
+	for (const __ResizeRequest &request : requests) {
+		__resizePath = request.target;
+		__resizeWidth = request.width;
+		__resizeHeight = request.height;
+		__resizeRatio = request.ratio;
+		__startResizeWorker(request.source, true);
 	}
 }
 
-MemoBoxItem::__ResizeJob *MemoBoxItem::__startResizeWorker(bool insertsPendingText)
+MemoBoxItem::__ResizeJob *MemoBoxItem::__startResizeWorker(const std::string &source, bool insertsPendingText)
 {
-	__ResizeJob *job =
-	    new __ResizeJob{this, __resizePath, __resizeWidth, __resizeHeight, __resizeRatio, insertsPendingText, nullptr};
+	__ResizeJob *job = new __ResizeJob{this,           source,        __resizePath,       __resizeWidth,
+	                                   __resizeHeight, __resizeRatio, insertsPendingText, nullptr};
 	__jobs.push_back(job);
 	Ecore_Thread *thread = ecore_thread_run(__resizeWorkerCb, __resizeWorkerEndCb, __resizeWorkerCancelCb, job);
 	// A failed start has already run the cancel callback, which freed the job.
@@ -219,15 +299,25 @@ void MemoBoxItem::__detachResizeJobs()
 	__threadHandle = nullptr;
 }
 
-// Worker: touches only the job's file.
+// Worker: reads the source and replaces the job's file with the shrunk picture; touches nothing else.
+// When shrinking fails, a target that does not exist yet gets a plain copy of the source.
 void MemoBoxItem::__resizeWorkerCb(void *data, Ecore_Thread *thread)
 {
 	(void)thread;
 	__ResizeJob *job = static_cast<__ResizeJob *>(data);
+	const std::string work = workFileFor(job->path);
 	if (isJpeg(job->path))
-		MemoUtil::resizeImageJpg(job->path.c_str(), job->path.c_str(), job->width, job->height, job->ratio);
+		MemoUtil::resizeImageJpg(job->source.c_str(), work.c_str(), job->width, job->height, job->ratio);
 	else
-		MemoUtil::resizeImage(job->path.c_str(), job->path.c_str(), job->width, job->height, 2);
+		MemoUtil::resizeImage(job->source.c_str(), work.c_str(), job->width, job->height, 2);
+	if (ecore_file_exists(work.c_str())) {
+		if (rename(work.c_str(), job->path.c_str()) != 0) {
+			MEMO_LOGE("Can not replace %s", job->path.c_str());
+			unlink(work.c_str());
+		}
+	}
+	if (!ecore_file_exists(job->path.c_str()) && job->source != job->path && !copyFile(job->source, job->path))
+		MEMO_LOGE("Copy failed: %s", job->source.c_str());
 }
 
 void MemoBoxItem::__resizeWorkerEndCb(void *data, Ecore_Thread *thread)

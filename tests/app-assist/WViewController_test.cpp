@@ -23,12 +23,6 @@ namespace
 class ViewControllerTest : public aa_test::UiTest
 {
 protected:
-	LoggingPage *pushPage(const char *tag)
-	{
-		LoggingPage *page = new LoggingPage(tag, &log);
-		EXPECT_TRUE(naviframe->push(page));
-		return page;
-	}
 	// A popup with the given buttons, attached to page.
 	WPopupController *attachPopup(LoggingPage *page, std::function<void(bool *)> first,
 	                              std::function<void(bool *)> second = nullptr)
@@ -42,11 +36,21 @@ protected:
 		EXPECT_TRUE(page->attachPopup(popup));
 		return popup;
 	}
+	// A shown menu with the given items, attached to page.
+	WMenuPopupController *openMenu(LoggingPage *page, std::vector<std::pair<const char *, std::function<void()>>> items)
+	{
+		WMenuPopupController *menu = new WMenuPopupController();
+		EXPECT_TRUE(menu->createMenu(window->getEvasObj(), naviframe->getEvasObj()));
+		for (auto &item : items)
+			EXPECT_TRUE(menu->appendItem(item.first, item.second));
+		EXPECT_TRUE(menu->showMenu());
+		EXPECT_TRUE(page->attachPopup(menu));
+		return menu;
+	}
 	static Evas_Object *button(WPopupController *popup, const char *part)
 	{
 		return elm_object_part_content_get(popup->getEvasObj(), part);
 	}
-	Log log;
 };
 
 TEST_F(ViewControllerTest, ControllerDiesWithItsObjectAndItsWeakPointerEmpties)
@@ -56,17 +60,14 @@ TEST_F(ViewControllerTest, ControllerDiesWithItsObjectAndItsWeakPointerEmpties)
 	ASSERT_EQ(weak.lock().get(), page);
 	evas_object_del(page->getEvasObj());
 	EXPECT_TRUE(weak.expired());
-	EXPECT_EQ(weak.lock(), nullptr);
 	EXPECT_EQ(log.back(), "A:destructor");
-}
 
-TEST_F(ViewControllerTest, DestroyWithoutObjectDeletesTheController)
-{
-	LoggingPage *page = new LoggingPage("A", &log);
-	WViewControllerWeakPtr weak = page->getWeakPtr();
-	page->destroy();
+	// Without an object, destroy deletes the controller.
+	log.clear();
+	weak = (new LoggingPage("B", &log))->getWeakPtr();
+	weak.lock()->destroy();
 	EXPECT_TRUE(weak.expired());
-	EXPECT_EQ(log, (Log{"A:constructor", "A:destructor"}));
+	EXPECT_EQ(log, (Log{"B:constructor", "B:destructor"}));
 }
 
 TEST_F(ViewControllerTest, PopupButtonClosesOnlyWhenItsFlagIsSet)
@@ -91,13 +92,10 @@ TEST_F(ViewControllerTest, PopupButtonClosesOnlyWhenItsFlagIsSet)
 	EXPECT_EQ(okCalls, 1);
 	EXPECT_TRUE(weak.expired());
 	EXPECT_EQ(page->getPopup(), nullptr);
-}
 
-TEST_F(ViewControllerTest, EmptyButtonFunctionLeavesThePopupOpen)
-{
-	LoggingPage *page = pushPage("A");
-	WPopupController *popup = attachPopup(page, nullptr);
-	WViewControllerWeakPtr weak = popup->getWeakPtr();
+	// An empty button function leaves the popup open.
+	popup = attachPopup(page, nullptr);
+	weak = popup->getWeakPtr();
 	evas_object_smart_callback_call(button(popup, "button1"), "clicked", nullptr);
 	EXPECT_FALSE(weak.expired());
 }
@@ -129,13 +127,9 @@ TEST_F(ViewControllerTest, BackKeyClosesThePopupBeforeThePage)
 TEST_F(ViewControllerTest, MenuRunsTheSelectedItemAndCloses)
 {
 	LoggingPage *page = pushPage("A");
-	WMenuPopupController *menu = new WMenuPopupController();
-	ASSERT_TRUE(menu->createMenu(window->getEvasObj(), naviframe->getEvasObj()));
 	Log picked;
-	ASSERT_TRUE(menu->appendItem("first", [&] { picked.push_back("first"); }));
-	ASSERT_TRUE(menu->appendItem("second", [&] { picked.push_back("second"); }));
-	ASSERT_TRUE(menu->showMenu());
-	ASSERT_TRUE(page->attachPopup(menu));
+	WMenuPopupController *menu = openMenu(
+	    page, {{"first", [&] { picked.push_back("first"); }}, {"second", [&] { picked.push_back("second"); }}});
 	WViewControllerWeakPtr weak = menu->getWeakPtr();
 
 	const Eina_List *items = elm_ctxpopup_items_get(menu->getEvasObj());
@@ -150,11 +144,7 @@ TEST_F(ViewControllerTest, MenuRunsTheSelectedItemAndCloses)
 TEST_F(ViewControllerTest, MenuItemMayReplaceTheMenuByAPopup)
 {
 	LoggingPage *page = pushPage("A");
-	WMenuPopupController *menu = new WMenuPopupController();
-	ASSERT_TRUE(menu->createMenu(window->getEvasObj(), naviframe->getEvasObj()));
-	menu->appendItem("delete", [&] { attachPopup(page, nullptr); });
-	menu->showMenu();
-	page->attachPopup(menu);
+	WMenuPopupController *menu = openMenu(page, {{"delete", [&] { attachPopup(page, nullptr); }}});
 	WViewControllerWeakPtr weak = menu->getWeakPtr();
 	Elm_Object_Item *item =
 	    static_cast<Elm_Object_Item *>(eina_list_data_get(elm_ctxpopup_items_get(menu->getEvasObj())));
@@ -183,6 +173,16 @@ TEST_F(ViewControllerTest, TimerRepeatsUntilFalseAndDiesWithItsOwner)
 	int after = ownedTicks;
 	runFor(0.1);
 	EXPECT_EQ(ownedTicks, after);
+
+	// A deleted timer never runs; deleting it again does nothing.
+	int runs = 0;
+	handle = WUiTimer::addTimer(
+	    0.0, [&](void *) { return ++runs > 0; }, nullptr);
+	WUiTimer::deleteTimer(handle);
+	EXPECT_TRUE(handle.expired());
+	runFor(0.05);
+	EXPECT_EQ(runs, 0);
+	WUiTimer::deleteTimer(handle);
 }
 
 TEST_F(ViewControllerTest, IdlerThatDeletesItsOwnerEndsCleanly)
@@ -200,18 +200,6 @@ TEST_F(ViewControllerTest, IdlerThatDeletesItsOwnerEndsCleanly)
 	ASSERT_TRUE(memo_test::pump(3.0, [&] { return runs == 1; }));
 	memo_test::pumpFor(0.1);
 	EXPECT_EQ(runs, 1);
-}
-
-TEST_F(ViewControllerTest, DeletedTimerNeverRuns)
-{
-	int runs = 0;
-	auto handle = WUiTimer::addTimer(
-	    0.0, [&](void *) { return ++runs > 0; }, nullptr);
-	WUiTimer::deleteTimer(handle);
-	EXPECT_TRUE(handle.expired());
-	runFor(0.05);
-	EXPECT_EQ(runs, 0);
-	WUiTimer::deleteTimer(handle); // ended already: nothing happens
 }
 
 struct CountingItem : WGengridItem {

@@ -4,6 +4,7 @@
 #include <Ecore_Evas.h>
 
 #include <cstdio>
+#include <cstdlib>
 #include <fstream>
 #include <sstream>
 #include <sys/stat.h>
@@ -12,13 +13,14 @@
 
 namespace memo_test
 {
-std::string &tempRootStorage()
+const std::string &tempRoot()
 {
-	static std::string root;
+	static const std::string root = [] {
+		char tmpl[] = "/tmp/memo-test-XXXXXX";
+		return std::string(mkdtemp(tmpl) ? tmpl : "");
+	}();
 	return root;
 }
-
-const std::string &tempRoot() { return tempRootStorage(); }
 
 std::string makeTempDir(const std::string &name)
 {
@@ -45,7 +47,10 @@ void pumpFor(double seconds)
 	pump(seconds, [] { return false; });
 }
 
-std::string helperPath(const std::string &name) { return std::string(TEST_HELPER_DIR) + "/" + name; }
+std::string helperPath(const std::string &name)
+{
+	return std::string(TEST_HELPER_DIR) + "/" + name;
+}
 
 bool saveScreenshot(Evas_Object *win, const std::string &pngPath)
 {

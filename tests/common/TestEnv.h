@@ -10,7 +10,7 @@
 // temporary root before any test runs, so no test touches the user's data.
 namespace memo_test
 {
-// The temporary root of this test process (removed at exit unless MEMO_TEST_KEEP is set).
+// The temporary root of this test process, made on first use (removed at exit unless MEMO_TEST_KEEP is set).
 const std::string &tempRoot();
 
 // A fresh empty folder under the temporary root.

@@ -8,11 +8,6 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-namespace memo_test
-{
-std::string &tempRootStorage();
-}
-
 static void setDir(const char *var, const std::string &path)
 {
 	mkdir(path.c_str(), 0700);
@@ -21,14 +16,11 @@ static void setDir(const char *var, const std::string &path)
 
 int main(int argc, char **argv)
 {
-	char tmpl[] = "/tmp/memo-test-XXXXXX";
-	const char *root = mkdtemp(tmpl);
-	if (!root) {
+	const std::string &r = memo_test::tempRoot();
+	if (r.empty()) {
 		perror("mkdtemp");
 		return 2;
 	}
-	memo_test::tempRootStorage() = root;
-	std::string r = root;
 	setDir("HOME", r + "/home");
 	setDir("XDG_DATA_HOME", r + "/xdg-data");
 	setDir("XDG_CONFIG_HOME", r + "/xdg-config");

@@ -30,27 +30,27 @@ protected:
 
 TEST(SavedMarkup, RemovesFormatTagsOnly)
 {
-	EXPECT_EQ("red bold", saved("<color=#ff0000>red</color> bold"));
-	EXPECT_EQ("left", saved("<align=left>left</align>"));
-	// "<u..." goes, its closing tag stays: the pass looks at the first letter only.
-	EXPECT_EQ("x</underline>", saved("<underline=on>x</underline>"));
-	EXPECT_EQ("x</u>", saved("<u>x</u>"));
 	const char *kept = "a &amp; b<br/><item size=240x180 vsize=full href=file:///m/a.jpg></item><br/>"
 	                   "<font_size=20>f</font_size><b>b</b>";
-	EXPECT_EQ(kept, saved(kept));
-}
-
-TEST(SavedMarkup, EndsAndUnclosedTags)
-{
-	// A "<" with fewer than two characters behind it ends the pass.
-	EXPECT_EQ("abc", saved("abc<"));
-	EXPECT_EQ("abc", saved("abc<x"));
-	EXPECT_EQ("abc<xdef", saved("abc<x<color>def"));
-	EXPECT_EQ("abc<br", saved("abc<br"));
-	// An unclosed format tag runs to the end.
-	EXPECT_EQ("abc", saved("abc<color=#fff"));
-	EXPECT_EQ("", saved(""));
-	EXPECT_EQ("", saved(nullptr));
+	const char *cases[][2] = {
+	    {"<color=#ff0000>red</color> bold", "red bold"},
+	    {"<align=left>left</align>", "left"},
+	    // "<u..." goes, its closing tag stays: the pass looks at the first letter only.
+	    {"<underline=on>x</underline>", "x</underline>"},
+	    {"<u>x</u>", "x</u>"},
+	    {kept, kept},
+	    // A "<" with fewer than two characters behind it ends the pass.
+	    {"abc<", "abc"},
+	    {"abc<x", "abc"},
+	    {"abc<x<color>def", "abc<xdef"},
+	    {"abc<br", "abc<br"},
+	    // An unclosed format tag runs to the end.
+	    {"abc<color=#fff", "abc"},
+	    {"", ""},
+	    {nullptr, ""},
+	};
+	for (const auto &c : cases)
+		EXPECT_EQ(c[1], saved(c[0])) << (c[0] ? c[0] : "(null)");
 }
 
 TEST(ShareMarkers, TwoTables)
@@ -61,7 +61,7 @@ TEST(ShareMarkers, TwoTables)
 	EXPECT_EQ("<CHECK state=maybe>", memoApplyListShareMarkers("<CHECK state=maybe>"));
 }
 
-TEST_F(ShareText, EditShareFromDocument)
+TEST_F(ShareText, EditShareFromDocumentOrDisplayContent)
 {
 	std::vector<MemoTodoListItem> items(3);
 	items[0].type = MEMO_BOX_ITEM_FIRST_TEXT;
@@ -77,10 +77,8 @@ TEST_F(ShareText, EditShareFromDocument)
 	EXPECT_EQ("Title\nFish & chips\xEF\xBC\x9C"
 	          "3\n\nx\n[v]milk\n[  ]eggs\n",
 	          text);
-}
 
-TEST_F(ShareText, EditShareFallsBackToDisplayContent)
-{
+	// Without a document the display content is shared, cut like a document.
 	EXPECT_EQ("[  ]ab\n", memoComposeEditShareText("", "",
 	                                               "<CHECK state=false>a\xC2\xA0"
 	                                               "b</CHECK>"));

@@ -2,50 +2,25 @@
 #include "store_test_fixture.h"
 
 #include <csignal>
-#include <spawn.h>
-#include <sys/wait.h>
-#include <time.h>
-#include <unistd.h>
 
+#include <Ecore.h>
 #include <Ecore_File.h>
-
-extern char **environ;
 
 using namespace store_test;
 
 namespace
 {
-double now()
-{
-	struct timespec ts;
-	clock_gettime(CLOCK_MONOTONIC, &ts);
-	return ts.tv_sec + ts.tv_nsec / 1e9;
-}
-
-// Starts the lock holder and returns once it holds the lock (or -1).
+// Starts the lock holder in the background; returns its pid once it holds the lock, or -1.
 pid_t holdLock(int seconds)
 {
-	std::string ready = memo_test::makeTempDir("lock") + "/ready";
-	std::string helper = memo_test::helperPath("test_dblock");
-	std::string secs = std::to_string(seconds);
-	std::string path = dbPath();
-	char *argv[] = {const_cast<char *>(helper.c_str()), const_cast<char *>(path.c_str()),
-	                const_cast<char *>(secs.c_str()), const_cast<char *>(ready.c_str()), nullptr};
-	pid_t pid = -1;
-	if (posix_spawn(&pid, helper.c_str(), nullptr, nullptr, argv, environ) != 0)
-		return -1;
-	if (!memo_test::pump(10.0, [&] { return ecore_file_exists(ready.c_str()) == EINA_TRUE; })) {
-		kill(pid, SIGKILL);
-		waitpid(pid, nullptr, 0);
-		return -1;
-	}
-	return pid;
-}
-
-void reap(pid_t pid)
-{
-	kill(pid, SIGTERM);
-	waitpid(pid, nullptr, 0);
+	std::string ready = memo_test::makeTempDir("lock") + "/ready", pid;
+	memo_test::runCommand(memo_test::helperPath("test_dblock") + " '" + dbPath() + "' " + std::to_string(seconds) +
+	                          " '" + ready + "' >/dev/null 2>&1 & echo $!",
+	                      &pid);
+	if (memo_test::pump(10.0, [&] { return ecore_file_exists(ready.c_str()) == EINA_TRUE; }))
+		return atoi(pid.c_str());
+	kill(atoi(pid.c_str()), SIGKILL);
+	return -1;
 }
 } // namespace
 
@@ -54,12 +29,11 @@ using DbLock = StoreTest;
 TEST_F(DbLock, ShortLockIsWaitedOut)
 {
 	ASSERT_NE(nullptr, db());
-	std::string uuid = query("SELECT UUID FROM memo WHERE isQuick = 1");
 	pid_t holder = holdLock(2);
 	ASSERT_GT(holder, 0);
-	EXPECT_TRUE(db()->setFavorite(uuid.c_str(), 1));
-	EXPECT_EQ(1, queryInt("SELECT isFavorite FROM memo WHERE isQuick = 1"));
-	reap(holder);
+	EXPECT_TRUE(db()->setFavorite(quickColumn("UUID").c_str(), 1));
+	EXPECT_EQ("1", quickColumn("isFavorite"));
+	kill(holder, SIGTERM);
 }
 
 TEST_F(DbLock, LongLockGivesBusyAfterTheRetries)
@@ -67,11 +41,11 @@ TEST_F(DbLock, LongLockGivesBusyAfterTheRetries)
 	ASSERT_NE(nullptr, db());
 	pid_t holder = holdLock(15);
 	ASSERT_GT(holder, 0);
-	double start = now();
+	double start = ecore_time_get();
 	char sql[] = "UPDATE memo SET isFavorite = 1";
 	int ret = db()->excuteSql(sql);
-	double waited = now() - start;
-	reap(holder);
+	double waited = ecore_time_get() - start;
+	kill(holder, SIGTERM);
 	EXPECT_EQ(SQLITE_BUSY, ret);
 	EXPECT_GE(waited, 9.0);
 }

@@ -7,6 +7,7 @@
 
 #include <cstdlib>
 #include <string>
+#include <vector>
 
 #include <Elementary.h>
 #include <app_common.h>
@@ -20,29 +21,27 @@
 
 namespace store_test
 {
-inline std::string dataPath()
+// Takes over a malloc'ed path.
+inline std::string takeN(char *path)
 {
-	char *path = app_get_data_path();
 	std::string result = path ? path : "";
 	free(path);
 	return result;
 }
 
+inline std::string dataPath()
+{
+	return takeN(app_get_data_path());
+}
+
 inline std::string sharedDataPath()
 {
-	char *path = app_get_shared_data_path();
-	std::string result = path ? path : "";
-	free(path);
-	return result;
+	return takeN(app_get_shared_data_path());
 }
 
 inline std::string dbPath()
 {
 	return dataPath() + "memo.db";
-}
-inline std::string logPath()
-{
-	return dataPath() + "dlog.log";
 }
 
 // First column of the first row as text: "<null>" for SQL NULL, "<none>" without a row.
@@ -67,13 +66,36 @@ inline long long queryInt(const std::string &sql)
 	return atoll(query(sql).c_str());
 }
 
-inline void clearLog()
+inline std::string memoColumn(const std::string &uuid, const char *column)
 {
-	memo_test::runCommand("rm -f '" + logPath() + "'");
+	return query(std::string("SELECT ") + column + " FROM memo WHERE UUID = '" + uuid + "'");
 }
-inline bool logContains(const std::string &text)
+
+inline std::string quickColumn(const char *column)
 {
-	return memo_test::readFile(logPath()).find(text) != std::string::npos;
+	return query(std::string("SELECT ") + column + " FROM memo WHERE isQuick = 1");
+}
+
+inline int changeNotice()
+{
+	int value = -1;
+	vconf_get_int("db/memo/data-change", &value);
+	return value;
+}
+
+// Runs one of the store's (key, &array, &count) reads and takes the array over.
+inline std::vector<std::string> listOf(bool (MemoDbMgr::*read)(const char *, char ***, int *), const char *key)
+{
+	char **items = nullptr;
+	int count = 0;
+	EXPECT_TRUE((MemoDbMgr::getInstance()->*read)(key, &items, &count)) << key;
+	std::vector<std::string> out;
+	for (int i = 0; i < count; ++i) {
+		out.push_back(items[i]);
+		free(items[i]);
+	}
+	free(items);
+	return out;
 }
 
 // A memo as the edit view would save it.
@@ -87,6 +109,19 @@ inline MemoDocInfo *makeMemo(const char *title, const char *body, unsigned long 
 	info->setCreatedAt(modifiedAt);
 	info->setLastModifiedAt(modifiedAt);
 	return info;
+}
+
+// Adds a memo through the store; returns its UUID.
+inline std::string addMemo(const char *title, const char *body, unsigned long long at, int favourite = 0,
+                           int hidden = 0)
+{
+	MemoDocInfo *info = makeMemo(title, body, at);
+	info->setIsFavorite(favourite);
+	info->setIsHidden(hidden);
+	std::string uuid = info->getMemoUUID();
+	EXPECT_TRUE(MemoDbMgr::getInstance()->addMemo(info));
+	delete info;
+	return uuid;
 }
 
 // Every test starts from no database, no media and the device keys unset.
@@ -108,7 +143,6 @@ protected:
 		for (const char *key : {"db/desktop/account/list", "db/desktop/account/unavailable",
 		                        "db/desktop/csc/feature_92", "db/memo/data-change"})
 			vconf_unset(key);
-		clearLog();
 	}
 
 	MemoDbMgr *db() { return MemoDbMgr::getInstance(); }

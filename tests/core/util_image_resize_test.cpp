@@ -3,36 +3,13 @@
 #include "Util/MemoUtil.h"
 #include "util_image_fixture.h"
 
-#include <Ecore.h>
 #include <Ecore_File.h>
 
 using namespace image_fixture;
 
 namespace
 {
-// Quadrants: red, green / blue, yellow.
-ColorFn quadrants(int w, int h)
-{
-	return [w, h](int x, int y) {
-		if (y < h / 2)
-			return x < w / 2 ? RED : GREEN;
-		return x < w / 2 ? BLUE : YELLOW;
-	};
-}
-
-void expectQuadrants(const Picture &pic)
-{
-	ASSERT_GT(pic.w, 0);
-	int qx = pic.w / 4, qy = pic.h / 4;
-	EXPECT_TRUE(near(RED, pic.at(qx, qy))) << std::hex << pic.at(qx, qy);
-	EXPECT_TRUE(near(GREEN, pic.at(3 * qx, qy))) << std::hex << pic.at(3 * qx, qy);
-	EXPECT_TRUE(near(BLUE, pic.at(qx, 3 * qy))) << std::hex << pic.at(qx, 3 * qy);
-	EXPECT_TRUE(near(YELLOW, pic.at(3 * qx, 3 * qy))) << std::hex << pic.at(3 * qx, 3 * qy);
-}
-
-class ResizeJpg : public ImageTest
-{
-};
+using ResizeJpg = ImageTest;
 
 TEST_F(ResizeJpg, LongerSideTakesTheLargerValue)
 {
@@ -40,15 +17,17 @@ TEST_F(ResizeJpg, LongerSideTakesTheLargerValue)
 		int srcW, srcH, w, h;
 		float scale;
 		int outW, outH;
+		bool inPlace;
 	} cases[] = {
-	    {1600, 1200, 652, 488, 0.41f, 652, 488}, // decoded at 1/2
-	    {1200, 1600, 652, 488, 0.2f, 488, 652},  // portrait, decoded at 1/4
-	    {800, 800, 300, 200, 0.1f, 200, 300},    // square: the values swap
-	    {640, 480, 200, 320, 1.0f, 320, 200},
+	    {1600, 1200, 652, 488, 0.41f, 652, 488, false}, // decoded at 1/2
+	    {1200, 1600, 652, 488, 0.2f, 488, 652, false},  // portrait, decoded at 1/4
+	    {800, 800, 300, 200, 0.1f, 200, 300, false},    // square: the values swap
+	    {640, 480, 200, 320, 1.0f, 320, 200, false},
+	    {1200, 900, 640, 480, 1.0f, 640, 480, true}, // the source replaced
 	};
 	for (const auto &c : cases) {
 		SCOPED_TRACE(std::to_string(c.srcW) + "x" + std::to_string(c.srcH));
-		std::string src = path("src.jpg"), dst = path("dst.jpg");
+		std::string src = path("src.jpg"), dst = c.inPlace ? src : path("dst.jpg");
 		writeJpeg(src, c.srcW, c.srcH, quadrants(c.srcW, c.srcH));
 		ASSERT_TRUE(MemoUtil::resizeImageJpg(src.c_str(), dst.c_str(), c.w, c.h, c.scale));
 		Picture pic = readImage(dst);
@@ -56,17 +35,6 @@ TEST_F(ResizeJpg, LongerSideTakesTheLargerValue)
 		EXPECT_EQ(c.outH, pic.h);
 		expectQuadrants(pic);
 	}
-}
-
-TEST_F(ResizeJpg, ReplacesTheSourceInPlace)
-{
-	std::string p = path("photo.jpg");
-	writeJpeg(p, 1200, 900, quadrants(1200, 900));
-	ASSERT_TRUE(MemoUtil::resizeImageJpg(p.c_str(), p.c_str(), 640, 480));
-	Picture pic = readImage(p);
-	EXPECT_EQ(640, pic.w);
-	EXPECT_EQ(480, pic.h);
-	expectQuadrants(pic);
 }
 
 TEST_F(ResizeJpg, OnlyAMissingOrUndecodableSourceFails)
@@ -86,20 +54,35 @@ TEST_F(ResizeJpg, OnlyAMissingOrUndecodableSourceFails)
 	EXPECT_TRUE(MemoUtil::resizeImageJpg(src.c_str(), path("no/such/dir/x.jpg").c_str(), 32, 24));
 }
 
-class ResizeImage : public ImageTest
-{
-};
+using ResizeImage = ImageTest;
 
-TEST_F(ResizeImage, CanvasTakesThePictureWidthInMode1)
+// Mode 1 replaces the given width by the picture's proportion at the given height; mode 2 stretches. The
+// editor shrinks non-JPEG pictures on a worker thread.
+TEST_F(ResizeImage, Mode1KeepsTheProportionMode2Stretches)
 {
-	std::string src = path("pic.png"), dst = path("out.png");
-	writeEvasImage(src, 1000, 500, quadrants(1000, 500));
-	// The given width is replaced by the picture's proportion at the given height.
-	ASSERT_TRUE(MemoUtil::resizeImage(src.c_str(), dst.c_str(), 123, 300, 1));
-	Picture pic = readImage(dst);
-	EXPECT_EQ(600, pic.w);
-	EXPECT_EQ(300, pic.h);
-	expectQuadrants(pic);
+	std::string wide = path("wide.png"), tall = path("tall.png");
+	writeEvasImage(wide, 1000, 500, quadrants(1000, 500));
+	writeEvasImage(tall, 100, 400, quadrants(100, 400));
+	struct {
+		std::string src, dst;
+		int w, h, mode, outW, outH;
+	} cases[] = {
+	    {wide, path("out.png"), 123, 300, 1, 600, 300},
+	    {tall, path("out.jpg"), 400, 100, 2, 400, 100},
+	    {wide, wide, 400, 200, 1, 400, 200},
+	};
+	for (const auto &c : cases) {
+		SCOPED_TRACE(c.dst);
+		bool done = false;
+		runInWorker([&] { done = MemoUtil::resizeImage(c.src.c_str(), c.dst.c_str(), c.w, c.h, c.mode); });
+		ASSERT_TRUE(done);
+		Picture pic = readImage(c.dst);
+		EXPECT_EQ(c.outW, pic.w);
+		EXPECT_EQ(c.outH, pic.h);
+		expectQuadrants(pic);
+	}
+	EXPECT_FALSE(MemoUtil::resizeImage(path("missing.png").c_str(), path("none.png").c_str(), 100, 100, 1));
+	EXPECT_FALSE(ecore_file_exists(path("none.png").c_str()));
 }
 
 TEST_F(ResizeImage, Mode0FitsTheHeightAndCentres)
@@ -112,17 +95,6 @@ TEST_F(ResizeImage, Mode0FitsTheHeightAndCentres)
 	EXPECT_FALSE(near(GREEN, pic.at(100, 100)));
 	EXPECT_TRUE(near(GREEN, pic.at(400, 100)));
 	EXPECT_FALSE(near(GREEN, pic.at(700, 100)));
-}
-
-TEST_F(ResizeImage, Mode2Stretches)
-{
-	std::string src = path("pic.png"), dst = path("out.jpg");
-	writeEvasImage(src, 100, 400, quadrants(100, 400));
-	ASSERT_TRUE(MemoUtil::resizeImage(src.c_str(), dst.c_str(), 400, 100, 2));
-	Picture pic = readImage(dst);
-	EXPECT_EQ(400, pic.w);
-	EXPECT_EQ(100, pic.h);
-	expectQuadrants(pic);
 }
 
 // Thumbnails: a tall picture keeps its top, a wide one its middle.
@@ -147,37 +119,5 @@ TEST_F(ResizeImage, Mode3CropsToTheBox)
 	EXPECT_TRUE(near(RED, w.at(2, 92))) << std::hex << w.at(2, 92);
 	EXPECT_TRUE(near(GREEN, w.at(161, 92))) << std::hex << w.at(161, 92);
 	EXPECT_TRUE(near(BLUE, w.at(319, 92))) << std::hex << w.at(319, 92);
-}
-
-TEST_F(ResizeImage, UnloadableSourceRendersNothing)
-{
-	std::string dst = path("out.png");
-	EXPECT_FALSE(MemoUtil::resizeImage(path("missing.png").c_str(), dst.c_str(), 100, 100, 1));
-	EXPECT_FALSE(ecore_file_exists(dst.c_str()));
-}
-
-// The editor shrinks non-JPEG pictures on a worker thread.
-TEST_F(ResizeImage, WorksFromAWorkerThread)
-{
-	struct Job {
-		std::string src, dst;
-		bool result = false, done = false;
-	} job;
-	job.src = path("pic.png");
-	job.dst = job.src;
-	writeEvasImage(job.src, 1000, 500, quadrants(1000, 500));
-	ecore_thread_run(
-	    [](void *data, Ecore_Thread *) {
-		    Job *j = static_cast<Job *>(data);
-		    j->result = MemoUtil::resizeImage(j->src.c_str(), j->dst.c_str(), 400, 200, 1);
-	    },
-	    [](void *data, Ecore_Thread *) { static_cast<Job *>(data)->done = true; },
-	    [](void *data, Ecore_Thread *) { static_cast<Job *>(data)->done = true; }, &job);
-	ASSERT_TRUE(memo_test::pump(10.0, [&] { return job.done; }));
-	EXPECT_TRUE(job.result);
-	Picture pic = readImage(job.dst);
-	EXPECT_EQ(400, pic.w);
-	EXPECT_EQ(200, pic.h);
-	expectQuadrants(pic);
 }
 } // namespace

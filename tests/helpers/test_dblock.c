@@ -1,6 +1,6 @@
 /* Holds a write lock on a SQLite file for a while, as the sync service would.
    Usage: test_dblock <db path> <seconds> <ready file>
-   Takes the lock, creates <ready file>, sleeps, then commits. */
+   Takes the lock, creates <ready file>, sleeps, then commits. Exit status 1 when the lock cannot be had. */
 #include <sqlite3.h>
 #include <stdio.h>
 #include <stdlib.h>
@@ -13,16 +13,10 @@ int main(int argc, char **argv)
 		return 2;
 	}
 	sqlite3 *db = NULL;
-	if (sqlite3_open_v2(argv[1], &db, SQLITE_OPEN_READWRITE, NULL) != SQLITE_OK) {
-		fprintf(stderr, "open: %s\n", sqlite3_errmsg(db));
-		sqlite3_close(db);
-		return 1;
-	}
-	char *message = NULL;
-	if (sqlite3_exec(db, "BEGIN IMMEDIATE; UPDATE android_metadata SET locale = locale;", NULL, NULL, &message) !=
-	    SQLITE_OK) {
-		fprintf(stderr, "lock: %s\n", message ? message : "?");
-		sqlite3_free(message);
+	if (sqlite3_open_v2(argv[1], &db, SQLITE_OPEN_READWRITE, NULL) != SQLITE_OK ||
+	    sqlite3_exec(db, "BEGIN IMMEDIATE; UPDATE android_metadata SET locale = locale;", NULL, NULL, NULL) !=
+	        SQLITE_OK) {
+		fprintf(stderr, "lock: %s\n", sqlite3_errmsg(db));
 		sqlite3_close(db);
 		return 1;
 	}

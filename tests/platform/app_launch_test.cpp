@@ -203,6 +203,11 @@ TEST_F(AppLaunch, UnknownOrBrokenAppsFailWithTizenErrors)
 
 	EXPECT_EQ(2, launcher("-s " + id + " -d onlykey", &out)) << out;
 	EXPECT_EQ(2, launcher("-s " + id + " -t soon", &out)) << out;
+	EXPECT_EQ(2, launcher("-s " + id + " -t nan", &out)) << out;
+	EXPECT_EQ(2, launcher("-o x -d key value", &out)) << out;
+	EXPECT_NE(std::string::npos, out.find("name the app with -s")) << out;
+	EXPECT_EQ(2, launcher("-s " + id + " -x", &out)) << out;
+	EXPECT_EQ(2, launcher("-s " + id + " -a list ''", &out)) << out;
 }
 
 TEST_F(AppLaunch, CalleeEndingWithoutReplyGivesCanceled)

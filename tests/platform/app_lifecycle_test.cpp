@@ -7,6 +7,7 @@
 #include <vconf.h>
 
 #include <cstdlib>
+#include <libintl.h>
 #include <string>
 #include <vector>
 
@@ -140,8 +141,26 @@ TEST_F(AppLifecycle, RefusedCreateEndsAtOnceWithoutRequestOrTerminate)
 	evas_object_del(run.win);
 }
 
-TEST_F(AppLifecycle, LanguageChangeInVconfReachesHandlersAndGettext)
+// Two text domains of the app, each with a German and a French catalogue.
+static void bindTwoDomains()
 {
+	std::string dir = memo_test::makeTempDir("lifecycle-locale");
+	const char *catalogues[][3] = {{"de", "lifecycle-a", "Hallo"},
+	                               {"de", "lifecycle-b", "Tschuess"},
+	                               {"fr", "lifecycle-a", "Bonjour"},
+	                               {"fr", "lifecycle-b", "Salut"}};
+	for (const auto &c : catalogues) {
+		std::string msgs = dir + "/" + c[0] + "/LC_MESSAGES";
+		ASSERT_EQ(0, memo_test::runCommand("mkdir -p '" + msgs + "' && printf 'msgid \"IDS_HELLO\"\\nmsgstr \"" + c[2] +
+		                                   "\"\\n' | msgfmt -o '" + msgs + "/" + c[1] + ".mo' -"));
+	}
+	bindtextdomain("lifecycle-a", dir.c_str());
+	bindtextdomain("lifecycle-b", dir.c_str());
+}
+
+TEST_F(AppLifecycle, LanguageChangeInVconfReachesHandlersAndEveryTextDomain)
+{
+	bindTwoDomains();
 	AppRun run;
 	run.onRequest = [](AppRun *r, app_control_h) {
 		auto langCb = [](app_event_info_h info, void *data) {
@@ -150,21 +169,27 @@ TEST_F(AppLifecycle, LanguageChangeInVconfReachesHandlersAndGettext)
 			EXPECT_EQ(APP_ERROR_NONE, app_event_get_language(info, &lang));
 			app_device_orientation_e o;
 			EXPECT_EQ(APP_ERROR_INVALID_CONTEXT, app_event_get_device_orientation(info, &o));
-			self->lang = lang ? lang : "";
+			std::string l = lang ? lang : "";
 			free(lang);
-			ui_app_exit();
+			self->lang +=
+			    l + ":" + dgettext("lifecycle-a", "IDS_HELLO") + "," + dgettext("lifecycle-b", "IDS_HELLO") + "|";
+			// The locale name stays the same between these two languages: only a dropped cache shows French.
+			if (l == "de_DE.UTF-8")
+				vconf_set_str(VCONFKEY_LANGSET, "fr_FR.UTF-8");
+			else
+				ui_app_exit();
 		};
 		auto removedCb = [](app_event_info_h, void *data) { static_cast<AppRun *>(data)->removedHandlerCalls++; };
 		ASSERT_EQ(APP_ERROR_NONE, ui_app_add_event_handler(&r->langHandler, APP_EVENT_LANGUAGE_CHANGED, langCb, r));
 		ASSERT_EQ(APP_ERROR_NONE,
 		          ui_app_add_event_handler(&r->removedHandler, APP_EVENT_LANGUAGE_CHANGED, removedCb, r));
 		EXPECT_EQ(APP_ERROR_NONE, ui_app_remove_event_handler(r->removedHandler));
-		vconf_set_str(VCONFKEY_LANGSET, "ko_KR.UTF-8");
+		vconf_set_str(VCONFKEY_LANGSET, "de_DE.UTF-8");
 	};
 	EXPECT_EQ(APP_ERROR_NONE, runApp(run));
-	EXPECT_EQ("ko_KR.UTF-8", run.lang);
+	EXPECT_EQ("de_DE.UTF-8:Hallo,Tschuess|fr_FR.UTF-8:Bonjour,Salut|", run.lang);
 	EXPECT_EQ(0, run.removedHandlerCalls);
-	EXPECT_STREQ("ko_KR.UTF-8", getenv("LANGUAGE"));
+	EXPECT_STREQ("fr_FR.UTF-8", getenv("LANGUAGE"));
 	EXPECT_EQ(APP_ERROR_NONE, ui_app_remove_event_handler(run.langHandler));
 	EXPECT_EQ(APP_ERROR_INVALID_PARAMETER, ui_app_remove_event_handler(run.langHandler));
 	vconf_set_str(VCONFKEY_LANGSET, "en_US.UTF-8");

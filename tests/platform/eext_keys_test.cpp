@@ -221,6 +221,27 @@ TEST_F(EextKeys, StockHandlersPopAndDelete)
 	EXPECT_EQ(nullptr, popup);
 }
 
+TEST_F(EextKeys, ToolkitBindingsNeverSeeTheKeys)
+{
+	// Elementary binds Escape on a focused naviframe to a pop of its own: the press must pop nothing
+	// beyond what the handler does.
+	ecore_evas_focus_set(ecore_evas_ecore_evas_get(evas), EINA_TRUE);
+	Evas_Object *nf = addNaviframe();
+	Evas_Object *button = elm_button_add(nf);
+	elm_naviframe_item_push(nf, "one", nullptr, nullptr, elm_button_add(nf), nullptr);
+	elm_naviframe_item_push(nf, "two", nullptr, nullptr, button, nullptr);
+	ASSERT_TRUE(memo_test::pump(5.0, [this] { return elm_win_focus_get(win); }));
+	elm_object_focus_set(button, EINA_TRUE);
+	memo_test::pumpFor(0.3);
+	Tag nfTag{&hits, "naviframe"};
+	eext_object_event_callback_add(nf, EEXT_CALLBACK_BACK, recordCb, &nfTag);
+
+	press("Escape");
+	memo_test::pumpFor(0.3);
+	EXPECT_EQ(std::vector<std::string>{"naviframe"}, hits.names);
+	EXPECT_NE(elm_naviframe_bottom_item_get(nf), elm_naviframe_top_item_get(nf));
+}
+
 TEST_F(EextKeys, NullArgumentsAreRejected)
 {
 	eext_object_event_callback_add(nullptr, EEXT_CALLBACK_BACK, recordCb, nullptr);

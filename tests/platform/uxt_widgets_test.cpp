@@ -78,6 +78,7 @@ TEST_F(UxtWidgets, EntryAndScrollerSwitches)
 
 	EXPECT_EQ(UXT_ERROR_INVALID_PARAMETER, uxt_entry_set_drag_enabled(nullptr, EINA_TRUE));
 	EXPECT_EQ(UXT_ERROR_INVALID_PARAMETER, uxt_entry_set_selection_enabled(nullptr, EINA_TRUE));
+	EXPECT_EQ(UXT_ERROR_INVALID_PARAMETER, uxt_entry_set_selection_enabled(scroller, EINA_TRUE)) << "not an entry";
 	EXPECT_EQ(UXT_ERROR_INVALID_PARAMETER, uxt_scroller_set_auto_scroll_enabled(nullptr, EINA_TRUE));
 }
 

@@ -81,11 +81,11 @@ TEST_F(BoxControlScreenshotTest, EditorWithEveryKindOfContent)
 	doc.setTitle("Weekend at the lake");
 	doc.setIsFavorite(1);
 	doc.setTizenXmlContent(
-		todoList(todoItem(0, false, escaped("We leave on Friday at six &amp;amp; meet at the pier.<br/>" + lakeTag)) +
-				 todoItem(1, true, "Sleeping bags") + todoItem(1, false, "Camera batteries") +
-				 todoItem(1, false, "Sunscreen") +
-				 todoItem(0, false, escaped("Last year's sunset from the dock:<br/>" + duskTag)))
-			.c_str());
+	    todoList(todoItem(0, false, escaped("We leave on Friday at six &amp;amp; meet at the pier.<br/>" + lakeTag)) +
+	             todoItem(1, true, "Sleeping bags") + todoItem(1, false, "Camera batteries") +
+	             todoItem(1, false, "Sunscreen") +
+	             todoItem(0, false, escaped("Last year's sunset from the dock:<br/>" + duskTag)))
+	        .c_str());
 	makeControl(&doc, MODE_UPDATE);
 	ASSERT_EQ(5u, items().size());
 	EXPECT_TRUE(items()[1]->getCheckStatus());

@@ -27,7 +27,7 @@ protected:
 	static std::string tag(int w, int h, const std::string &path)
 	{
 		return "<item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path +
-			   "></item>";
+		       "></item>";
 	}
 
 	static std::string escaped(const std::string &markup)
@@ -136,8 +136,8 @@ TEST_F(BoxImageItemTest, AMissingFileShowsTheDefaultLayoutAndKeepsItsTag)
 	const std::string present = picture("present.png");
 	const std::string missing = mediaDir() + "gone.jpg";
 	ecore_file_unlink(missing.c_str());
-	const std::string content = "a" + escaped(tag(628, 354, missing) + "<br/>") + "b" +
-								escaped(tag(628, 354, present) + "<br/>");
+	const std::string content =
+	    "a" + escaped(tag(628, 354, missing) + "<br/>") + "b" + escaped(tag(628, 354, present) + "<br/>");
 	const std::string xml = todoList(todoItem(0, false, escaped(content)));
 	doc.setTizenXmlContent(xml.c_str());
 	makeControl(&doc, MODE_UPDATE);
@@ -153,6 +153,24 @@ TEST_F(BoxImageItemTest, AMissingFileShowsTheDefaultLayoutAndKeepsItsTag)
 	ASSERT_EQ(2u, eina_list_count(images));
 	EXPECT_EQ(missing, static_cast<const char *>(eina_list_nth(images, 0)));
 	EXPECT_EQ(2, control->onEntryCheckImageCount());
+}
+
+// A large picture is decoded in the background and no larger than its place in the entry, so that
+// opening a memo never decodes a whole camera picture on the main loop.
+TEST_F(BoxImageItemTest, LargePicturesAreDecodedAtTheirDisplaySize)
+{
+	const std::string path = picture("camera.jpg", 2400, 1600);
+	doc.setTizenXmlContent(todoList(todoItem(0, false, escaped(tag(628, 458, path) + "<br/>"))).c_str());
+	makeControl(&doc, MODE_UPDATE);
+	std::vector<Evas_Object *> objects = imageObjects();
+	ASSERT_EQ(1u, objects.size());
+	Evas_Object *image = elm_object_part_content_get(objects[0], "image.swallow");
+	ASSERT_NE(nullptr, image);
+	int w = 0, h = 0;
+	evas_object_image_load_size_get(image, &w, &h);
+	EXPECT_GT(w, 0);
+	EXPECT_LE(w, 628);
+	EXPECT_LE(h, 1600 * 628 / 2400 + 1);
 }
 
 TEST_F(BoxImageItemTest, TapOnAPictureSelectsItsPath)
@@ -207,8 +225,8 @@ TEST_F(BoxImageItemTest, RemovingPicturesByPathAndByName)
 	const std::string one = picture("11111111-aaaa.png", 100, 100);
 	const std::string two = picture("22222222-bbbb.png", 100, 100);
 	doc.setTizenXmlContent(
-		todoList(todoItem(0, false, escaped("x" + tag(628, 668, one) + "<br/>y" + tag(628, 668, two) + "<br/>")))
-			.c_str());
+	    todoList(todoItem(0, false, escaped("x" + tag(628, 668, one) + "<br/>y" + tag(628, 668, two) + "<br/>")))
+	        .c_str());
 	makeControl(&doc, MODE_UPDATE);
 	MemoBoxItem *item = items()[0];
 	ASSERT_EQ(2, control->onEntryCheckImageCount());

@@ -8,6 +8,7 @@
 #include <libintl.h>
 
 #include "Model/MemoBroadCaster.h"
+#include "TestEnv.h"
 #include "Util/MemoUtil.h"
 #include "support/FakeBoxOwner.h"
 #include "support/UiTestSupport.h"
@@ -252,6 +253,42 @@ TEST_F(BoxItemEventsTest, QuickMemoBodyDescribesItselfAndFollowsTheBus)
 	elm_object_part_text_set(quick->getEntry(), "elm.guide", "");
 	MemoBroadCaster::getInstance().emit("broadcast,language,changed", nullptr);
 	EXPECT_EQ(expected, guide(quick));
+}
+
+namespace
+{
+int countInLog(const std::string &needle)
+{
+	const std::string log = memo_test::readFile(std::string(MemoUtil::getDataPath()) + "dlog.log");
+	int n = 0;
+	for (size_t at = log.find(needle); at != std::string::npos; at = log.find(needle, at + 1))
+		n++;
+	return n;
+}
+} // namespace
+
+// Only a quick memo body being read listens to the bus, and each item leaves it exactly once, whether
+// the item or its layout goes first.
+TEST_F(BoxItemEventsTest, ItemsLeaveTheBusOnceWhicheverGoesFirst)
+{
+	MemoBroadCaster::Signal &bus = MemoBroadCaster::getInstance();
+	const size_t listeners = bus.getListenerCount();
+	const int complaints = countInLog("Already removed listener");
+	MemoBoxItem *plain = owner->addItem(MEMO_BOX_ITEM_TEXT);
+	MemoBoxItem *quick = owner->addItem(MEMO_BOX_ITEM_QUICK_TEXT, false);
+	MemoBoxItem *other = owner->addItem(MEMO_BOX_ITEM_QUICK_TEXT, false);
+	EXPECT_EQ(listeners + 2, bus.getListenerCount());
+
+	owner->removeItem(plain);
+	owner->removeItem(quick);
+	EXPECT_EQ(listeners + 1, bus.getListenerCount());
+
+	Evas_Object *layout = other->getLayout();
+	elm_box_unpack(box, layout);
+	evas_object_del(layout);
+	EXPECT_EQ(listeners, bus.getListenerCount());
+	owner->removeItem(other);
+	EXPECT_EQ(complaints, countInLog("Already removed listener"));
 }
 
 TEST_F(BoxItemEventsTest, TypingAndFocusReachTheOwner)

@@ -5,6 +5,7 @@
 #include "app_private.h"
 
 #include <dlog.h>
+#include <libintl.h>
 #include <locale.h>
 #include <stdlib.h>
 #include <string.h>
@@ -161,7 +162,7 @@ void app_event_language_apply(void)
 		free(lang);
 		return;
 	}
-	/* gettext reads LANGUAGE first; setlocale() also drops its cache of translations. */
+	/* gettext reads LANGUAGE first. */
 	setenv("LANGUAGE", lang, 1);
 	setenv("LANG", lang, 1);
 	if (getenv("LC_ALL"))
@@ -170,6 +171,9 @@ void app_event_language_apply(void)
 		/* The language has no system locale here: C.UTF-8 still honours LANGUAGE, plain C would not. */
 		setlocale(LC_ALL, "C.UTF-8");
 	}
+	/* gettext caches translations under the locale name, which often stays C.UTF-8 from one language
+	   to the next; re-announcing the text domain drops that cache for every bound domain. */
+	textdomain(textdomain(NULL));
 	LOGI("language %s", lang);
 	free(lang);
 }

@@ -5,9 +5,13 @@
  * every smart parent and clipper visible), on the highest layer, under the top-level object highest in the
  * stacking order, and within it the topmost, deepest member. Only that object's callbacks run.
  *
+ * The keys are grabbed exclusively: the focused widget never sees them, so no toolkit binding of its own
+ * (Escape pops a naviframe, closes a popup) acts on the same press.
+ *
  * A window close request is not taken as back: closing the window must always be able to end the app. */
 #include <efl_extension.h>
 
+#include <canvas/efl_canvas_group.eo.h>
 #include <dlog.h>
 #include <stdint.h>
 #include <string.h>
@@ -132,7 +136,8 @@ static Eina_Bool __isCandidate(const Eina_List *candidates, const Evas_Object *o
    object wins over the containers around it. */
 static Evas_Object *__searchMembers(Evas_Object *obj, const Eina_List *candidates)
 {
-	Eina_List *members = evas_object_smart_members_get(obj);
+	/* Asking a primitive for its members makes Evas log an error, so only groups are opened. */
+	Eina_List *members = efl_isa(obj, EFL_CANVAS_GROUP_CLASS) ? evas_object_smart_members_get(obj) : NULL;
 	Evas_Object *found = NULL;
 	Eina_List *l;
 	Evas_Object *member;
@@ -259,8 +264,11 @@ static Eina_Bool __grabberEnsure(Evas *evas)
 	grabber->evas = evas;
 	grabber->grabber = evas_object_rectangle_add(evas);
 	evas_object_pass_events_set(grabber->grabber, EINA_TRUE);
+	/* Exclusive, so that the keys reach nothing else: Elementary binds Escape itself (a naviframe pops, a
+	   popup or context popup closes), and a second handling of the same press would take two steps back. */
 	for (const char *const *key = eext_key_names(); *key; key++) {
-		if (!evas_object_key_grab(grabber->grabber, *key, 0, 0, EINA_FALSE))
+		if (!evas_object_key_grab(grabber->grabber, *key, 0, 0, EINA_TRUE) &&
+		    !evas_object_key_grab(grabber->grabber, *key, 0, 0, EINA_FALSE))
 			LOGE("cannot grab key %s", *key);
 	}
 	evas_object_event_callback_add(grabber->grabber, EVAS_CALLBACK_KEY_UP, __keyUpCb, NULL);

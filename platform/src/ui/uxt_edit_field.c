@@ -15,13 +15,13 @@ static Eina_Bool __isScrollable(int type)
 	return type != UXT_EDIT_FIELD_SINGLELINE && type != UXT_EDIT_FIELD_MULTILINE;
 }
 
-/* The button shows only while there is something to clear. */
+/* The button shows only while the field is being edited and there is something to clear. */
 static void __clearButtonUpdate(Evas_Object *entry)
 {
 	Evas_Object *button = evas_object_data_get(entry, CLEAR_BUTTON_KEY);
 	if (!button)
 		return;
-	Eina_Bool show = !elm_entry_is_empty(entry) && elm_entry_editable_get(entry);
+	Eina_Bool show = !elm_entry_is_empty(entry) && elm_entry_editable_get(entry) && elm_object_focus_get(entry);
 	if (elm_object_part_content_get(entry, "elm.swallow.clear") == button) {
 		if (show)
 			evas_object_show(button);
@@ -72,6 +72,8 @@ static void __addClearButton(Evas_Object *entry)
 	evas_object_data_set(entry, CLEAR_BUTTON_KEY, button);
 	evas_object_smart_callback_add(entry, "changed", __entryChangedCb, NULL);
 	evas_object_smart_callback_add(entry, "preedit,changed", __entryChangedCb, NULL);
+	evas_object_smart_callback_add(entry, "focused", __entryChangedCb, NULL);
+	evas_object_smart_callback_add(entry, "unfocused", __entryChangedCb, NULL);
 	__clearButtonUpdate(entry);
 }
 

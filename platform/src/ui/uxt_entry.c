@@ -3,6 +3,7 @@
 #include <uxt_scroller.h>
 
 #include <dlog.h>
+#include <elm_entry_eo.h>
 #include <stdint.h>
 
 #define DRAG_KEY "__uxt_drag_enabled"
@@ -25,8 +26,8 @@ Eina_Bool uxt_entry_get_drag_enabled(const Evas_Object *entry)
 
 int uxt_entry_set_selection_enabled(Evas_Object *entry, Eina_Bool enabled)
 {
-	if (!entry) {
-		LOGE("entry is NULL");
+	if (!entry || !efl_isa(entry, ELM_ENTRY_CLASS)) {
+		LOGE("%p is not an entry", (void *)entry);
 		return UXT_ERROR_INVALID_PARAMETER;
 	}
 	elm_entry_select_allow_set(entry, enabled);
@@ -35,7 +36,7 @@ int uxt_entry_set_selection_enabled(Evas_Object *entry, Eina_Bool enabled)
 
 Eina_Bool uxt_entry_get_selection_enabled(const Evas_Object *entry)
 {
-	return entry && elm_entry_select_allow_get(entry);
+	return entry && efl_isa(entry, ELM_ENTRY_CLASS) && elm_entry_select_allow_get(entry);
 }
 
 int uxt_scroller_set_auto_scroll_enabled(Evas_Object *scroller, Eina_Bool enabled)

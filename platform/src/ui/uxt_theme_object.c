@@ -3,6 +3,7 @@
 #include <efl_assist_theme.h>
 #include <uxt_theme.h>
 
+#include <canvas/efl_canvas_group.eo.h>
 #include <dlog.h>
 #include <string.h>
 
@@ -12,6 +13,8 @@ static Evas_Object *__edjeOf(Evas_Object *obj)
 	const char *type = evas_object_type_get(obj);
 	if (type && !strcmp(type, "edje"))
 		return obj;
+	if (!efl_isa(obj, EFL_CANVAS_GROUP_CLASS))
+		return NULL; /* a primitive has no members, and asking makes Evas log an error */
 	Eina_List *members = evas_object_smart_members_get(obj);
 	Evas_Object *edje = NULL;
 	Eina_List *l;

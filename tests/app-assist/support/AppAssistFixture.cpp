@@ -3,6 +3,8 @@
 
 #include "TestEnv.h"
 
+#include <algorithm>
+
 namespace aa_test
 {
 
@@ -77,20 +79,30 @@ void UiTest::runFor(double seconds)
 	waitFor([end] { return ecore_time_get() > end; });
 }
 
-LoggingPage::LoggingPage(const std::string &tag, std::vector<std::string> *log, bool failCreate)
-    : __tag(tag), __log(log), __failCreate(failCreate)
+LoggingPage *UiTest::pushPage(const char *tag)
 {
-	__log->push_back(__tag + ":constructor");
+	LoggingPage *page = new LoggingPage(tag, &log);
+	EXPECT_TRUE(naviframe->push(page));
+	return page;
 }
 
-LoggingPage::~LoggingPage()
+std::vector<std::string> UiTest::entriesOf(const std::string &tag) const
 {
-	__log->push_back(__tag + ":destructor");
+	std::vector<std::string> out;
+	for (const std::string &line : log)
+		if (line.compare(0, tag.size() + 1, tag + ":") == 0)
+			out.push_back(line.substr(tag.size() + 1));
+	return out;
+}
+
+bool UiTest::hasEntry(const std::string &line) const
+{
+	return std::find(log.begin(), log.end(), line) != log.end();
 }
 
 Evas_Object *LoggingPage::onCreateView(Evas_Object *parent, void *param)
 {
-	__log->push_back(__tag + ":onCreateView");
+	__note("onCreateView");
 	receivedParam = param;
 	if (__failCreate)
 		return nullptr;
@@ -98,31 +110,6 @@ Evas_Object *LoggingPage::onCreateView(Evas_Object *parent, void *param)
 	elm_object_text_set(label, ("Page " + __tag).c_str());
 	evas_object_show(label);
 	return label;
-}
-
-void LoggingPage::onCreated()
-{
-	__log->push_back(__tag + ":onCreated");
-}
-
-void LoggingPage::onPushed(Elm_Object_Item *naviItem)
-{
-	__log->push_back(__tag + (naviItem == getNaviItem() ? ":onPushed" : ":onPushed(wrong item)"));
-}
-
-void LoggingPage::onPop()
-{
-	__log->push_back(__tag + ":onPop");
-}
-
-void LoggingPage::onBecomeTop()
-{
-	__log->push_back(__tag + ":onBecomeTop");
-}
-
-void LoggingPage::onDestroy()
-{
-	__log->push_back(__tag + ":onDestroy");
 }
 
 } // namespace aa_test

@@ -13,6 +13,7 @@
 
 namespace aa_test
 {
+class LoggingPage;
 
 // Elementary up once per process; every test gets a fresh window with a naviframe as its base view.
 class UiTest : public ::testing::Test
@@ -28,7 +29,13 @@ protected:
 	bool waitFor(const std::function<bool()> &pred);
 	// Runs the main loop for the given time.
 	void runFor(double seconds);
+	// Pushes a new LoggingPage that writes to log.
+	LoggingPage *pushPage(const char *tag);
+	// The log entries of one page, in order, without the "<tag>:" prefix.
+	std::vector<std::string> entriesOf(const std::string &tag) const;
+	bool hasEntry(const std::string &line) const;
 
+	std::vector<std::string> log;
 	app_assist::WWindowController *window = nullptr;
 	app_assist::WNaviframeController *naviframe = nullptr;
 };
@@ -37,22 +44,28 @@ protected:
 class LoggingPage : public app_assist::WContentViewController
 {
 public:
-	LoggingPage(const std::string &tag, std::vector<std::string> *log, bool failCreate = false);
-	~LoggingPage() override;
+	LoggingPage(const std::string &tag, std::vector<std::string> *log, bool failCreate = false)
+	    : __tag(tag), __log(log), __failCreate(failCreate)
+	{
+		__note("constructor");
+	}
+	~LoggingPage() override { __note("destructor"); }
 	const char *getClassName() const override { return "LoggingPage"; }
 
-	void onPushed(Elm_Object_Item *naviItem) override;
-	void onPop() override;
-	void onBecomeTop() override;
+	void onPushed(Elm_Object_Item *naviItem) override { __note(naviItem == getNaviItem() ? "onPushed" : "onPushed?"); }
+	void onPop() override { __note("onPop"); }
+	void onBecomeTop() override { __note("onBecomeTop"); }
 
 	void *receivedParam = nullptr;
 
 protected:
 	Evas_Object *onCreateView(Evas_Object *parent, void *param) override;
-	void onCreated() override;
-	void onDestroy() override;
+	void onCreated() override { __note("onCreated"); }
+	void onDestroy() override { __note("onDestroy"); }
 
 private:
+	void __note(const char *operation) { __log->push_back(__tag + ":" + operation); }
+
 	std::string __tag;
 	std::vector<std::string> *__log;
 	bool __failCreate;

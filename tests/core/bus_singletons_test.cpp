@@ -1,10 +1,16 @@
-// The popup monitor with real popups: it answers for the last popup registered, and only while it exists.
+// The process-wide singletons of the model with real objects: the popup monitor answers for the last popup
+// registered, and only while it exists; the broadcast bus (a WSignal, whose emission rules have their own
+// tests) drops its listeners and their owner callbacks with destroy.
 #include <gtest/gtest.h>
 
 #include <Elementary.h>
 
+#include <string>
+#include <vector>
+
 #include <WPopupController.h>
 
+#include "Model/MemoBroadCaster.h"
 #include "Model/MemoPopupMonitor.h"
 #include "TestEnv.h"
 
@@ -13,19 +19,19 @@ using app_assist::WPopupController;
 namespace
 {
 
-class PopupMonitorTest : public ::testing::Test
+class BusTest : public ::testing::Test
 {
 protected:
 	static void SetUpTestSuite()
 	{
-		static char arg0[] = "popup-monitor-test";
+		static char arg0[] = "bus-test";
 		static char *argv[] = {arg0, nullptr};
 		elm_init(1, argv);
 	}
 
 	void SetUp() override
 	{
-		win = elm_win_add(nullptr, "popup-monitor-test", ELM_WIN_BASIC);
+		win = elm_win_add(nullptr, "bus-test", ELM_WIN_BASIC);
 		ASSERT_NE(win, nullptr);
 		evas_object_resize(win, 480, 800);
 		evas_object_show(win);
@@ -34,6 +40,7 @@ protected:
 	void TearDown() override
 	{
 		MemoPopupMonitor::destroy();
+		MemoBroadCaster::destroy();
 		evas_object_del(win);
 		memo_test::pumpFor(0.02);
 	}
@@ -50,36 +57,24 @@ protected:
 	Evas_Object *win = nullptr;
 };
 
-TEST_F(PopupMonitorTest, nothingTrackedAndNullInputChangeNothing)
+TEST_F(BusTest, popupClosedOnItsOwnIsNotAlive)
 {
 	MemoPopupMonitor *monitor = MemoPopupMonitor::getInstance();
 	EXPECT_FALSE(monitor->isPopupAlive());
-	EXPECT_EQ(monitor->getPopup(), nullptr);
-
-	WPopupController *popup = openPopup("first");
-	monitor->addPopup(popup);
-	monitor->addPopup(nullptr);
-	EXPECT_TRUE(monitor->isPopupAlive());
-	EXPECT_EQ(monitor->getPopup(), popup);
-	popup->destroy();
-}
-
-TEST_F(PopupMonitorTest, popupClosedOnItsOwnIsNotAlive)
-{
-	MemoPopupMonitor *monitor = MemoPopupMonitor::getInstance();
 	WPopupController *popup = openPopup("closes by itself");
 	monitor->addPopup(popup);
+	monitor->addPopup(nullptr); // changes nothing
 	ASSERT_TRUE(monitor->isPopupAlive());
+	EXPECT_EQ(monitor->getPopup(), popup);
 
 	// Gone without a word to the monitor, as when the back key or a button closes it.
 	evas_object_del(popup->getEvasObj());
 	memo_test::pumpFor(0.02);
-
 	EXPECT_FALSE(monitor->isPopupAlive());
 	EXPECT_EQ(monitor->getPopup(), nullptr);
 }
 
-TEST_F(PopupMonitorTest, twoPopupsInTurnOnlyTheLastCounts)
+TEST_F(BusTest, onlyTheLastPopupCountsUntilDestroy)
 {
 	MemoPopupMonitor *monitor = MemoPopupMonitor::getInstance();
 	WPopupController *first = openPopup("first");
@@ -97,18 +92,26 @@ TEST_F(PopupMonitorTest, twoPopupsInTurnOnlyTheLastCounts)
 
 	monitor->addPopup(first);
 	EXPECT_TRUE(monitor->isPopupAlive());
-	first->destroy();
-	memo_test::pumpFor(0.02);
-	EXPECT_FALSE(monitor->isPopupAlive());
-}
-
-TEST_F(PopupMonitorTest, destroyForgetsThePopup)
-{
-	WPopupController *popup = openPopup("kept");
-	MemoPopupMonitor::getInstance()->addPopup(popup);
 	MemoPopupMonitor::destroy();
 	EXPECT_FALSE(MemoPopupMonitor::getInstance()->isPopupAlive());
-	popup->destroy();
+	first->destroy();
+}
+
+TEST_F(BusTest, broadcasterDestroyDropsListenersAndOwnerCallbacks)
+{
+	Evas_Object *view = evas_object_rectangle_add(evas_object_evas_get(win));
+	std::vector<std::string> heard;
+	MemoBroadCaster::getInstance().addListener([&](const char *key, void *) { heard.push_back(key); }, view);
+	MemoBroadCaster::getInstance().addListener([&](const char *key, void *) { heard.push_back(key); });
+	MemoBroadCaster::getInstance().emit("broadcast,memo,app,pause", nullptr);
+	EXPECT_EQ(heard.size(), 2u);
+
+	MemoBroadCaster::destroy();
+	// The owner's delete callback was taken away with the bus: deleting the view touches nothing freed.
+	evas_object_del(view);
+	MemoBroadCaster::getInstance().emit("broadcast,language,changed", nullptr);
+	EXPECT_EQ(heard.size(), 2u);
+	EXPECT_EQ(MemoBroadCaster::getInstance().getListenerCount(), 0u);
 }
 
 } // namespace
