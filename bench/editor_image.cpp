@@ -28,9 +28,12 @@
 #include "Box/MemoBoxItem.h"
 #include "Util/MemoUtil.h"
 
+#include "BenchPhoto.h"
+
+using namespace memo_bench;
+
 namespace
 {
-const int PHOTO_W = 4000, PHOTO_H = 3000;
 const char *const MEMO_UUID = "bench-editor-memo";
 // How long the loop is watched after the tag has arrived: the worker of a gallery insert and the
 // background decode of the picture run in this time.
@@ -92,24 +95,6 @@ bool setUpEnvironment()
 	unsetenv("DISPLAY");
 	unsetenv("WAYLAND_DISPLAY");
 	return true;
-}
-
-// A photo-like picture: smooth light with noise, so that it compresses like a camera shot.
-bool makePhoto(const std::string &path)
-{
-	std::vector<unsigned char> rgb(static_cast<size_t>(PHOTO_W) * PHOTO_H * 3);
-	unsigned int seed = 2024;
-	for (int y = 0; y < PHOTO_H; y++)
-		for (int x = 0; x < PHOTO_W; x++) {
-			unsigned char *p = &rgb[(static_cast<size_t>(y) * PHOTO_W + x) * 3];
-			seed = seed * 1103515245u + 12345u;
-			const int noise = static_cast<int>((seed >> 16) % 24);
-			p[0] = static_cast<unsigned char>(40 + 180 * x / PHOTO_W + noise);
-			p[1] = static_cast<unsigned char>(60 + 150 * y / PHOTO_H + noise);
-			p[2] = static_cast<unsigned char>(120 + ((x / 50 + y / 50) % 2) * 60 + noise / 2);
-		}
-	return image_util_encode_jpeg(rgb.data(), PHOTO_W, PHOTO_H, IMAGE_UTIL_COLORSPACE_RGB888, 92, path.c_str()) ==
-	       IMAGE_UTIL_ERROR_NONE;
 }
 
 enum InsertKind { TYPING, PASTE, GALLERY };
@@ -295,7 +280,7 @@ int main(int argc, char **argv)
 
 	// The picture lies outside the memo, as in the gallery.
 	const std::string photo = gRoot + "/camera.jpg";
-	if (!makePhoto(photo)) {
+	if (!makePhoto(photo, 2024)) {
 		fprintf(stderr, "cannot write the test photo\n");
 		return 2;
 	}

@@ -14,29 +14,14 @@
 #include <string>
 #include <vector>
 
+#include "BenchPhoto.h"
+
+using namespace memo_bench;
+
 namespace
 {
-const int PHOTO_W = 4000, PHOTO_H = 3000;
 std::string gDir;
 std::string gPhoto;
-
-// A photo-like picture: smooth light with noise, so that it compresses like a camera shot.
-bool makePhoto(const std::string &path)
-{
-	std::vector<unsigned char> rgb(static_cast<size_t>(PHOTO_W) * PHOTO_H * 3);
-	unsigned int seed = 12345;
-	for (int y = 0; y < PHOTO_H; y++)
-		for (int x = 0; x < PHOTO_W; x++) {
-			unsigned char *p = &rgb[(static_cast<size_t>(y) * PHOTO_W + x) * 3];
-			seed = seed * 1103515245u + 12345u;
-			int noise = static_cast<int>((seed >> 16) % 24);
-			p[0] = static_cast<unsigned char>(40 + 180 * x / PHOTO_W + noise);
-			p[1] = static_cast<unsigned char>(60 + 150 * y / PHOTO_H + noise);
-			p[2] = static_cast<unsigned char>(120 + ((x / 50 + y / 50) % 2) * 60 + noise / 2);
-		}
-	return image_util_encode_jpeg(rgb.data(), PHOTO_W, PHOTO_H, IMAGE_UTIL_COLORSPACE_RGB888, 92, path.c_str()) ==
-	       IMAGE_UTIL_ERROR_NONE;
-}
 
 // Tags the photo as taken upright in portrait (orientation 6), as a phone camera does.
 bool tagPortrait(const std::string &path)
@@ -130,7 +115,7 @@ int main(int argc, char **argv)
 	setenv("ECORE_NO_SYSTEM_MODULES", "1", 1);
 	setenv("EINA_LOG_BACKTRACE", "0", 1);
 	ecore_evas_init();
-	if (!makePhoto(gPhoto) || !tagPortrait(gPhoto)) {
+	if (!makePhoto(gPhoto, 12345) || !tagPortrait(gPhoto)) {
 		fprintf(stderr, "cannot write the test photo\n");
 		return 2;
 	}

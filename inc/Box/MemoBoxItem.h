@@ -153,6 +153,11 @@ private:
 	// The display size of the picture at `path` in this item: the width of its kind, the height
 	// scaled from the picture plus 40, or the default height when the picture cannot be loaded.
 	void __getImgDisplaySize(const char *path, int *width, int *height);
+	// False with "path is null." or "__entryObj is NULL" when an image operation cannot go ahead.
+	bool __canEditImage(const char *path) const;
+	// Erases the tag of `path` from the entry's markup with `erase` and sets the rest. False with
+	// "Can not find this image" when `erase` finds none.
+	bool __eraseImageTag(const char *path, bool (*erase)(std::string &, const char *));
 	// Item provider of the entry; `data` is the item.
 	static Evas_Object *__onEntryItemProviderCb(void *data, Evas_Object *entry, const char *item);
 	// EVAS_CALLBACK_DEL of an image object made by the provider, registered with the item as data.

@@ -28,7 +28,7 @@ bool cursorPastLeftEdge(Evas_Object *entry)
 }
 } // namespace
 
-bool MemoBoxItem::insertImage(const char *path)
+bool MemoBoxItem::__canEditImage(const char *path) const
 {
 	if (!path) {
 		MEMO_LOGE("path is null.");
@@ -38,6 +38,13 @@ bool MemoBoxItem::insertImage(const char *path)
 		MEMO_LOGE("__entryObj is NULL");
 		return false;
 	}
+	return true;
+}
+
+bool MemoBoxItem::insertImage(const char *path)
+{
+	if (!__canEditImage(path))
+		return false;
 	int pictureWidth = 0, pictureHeight = 0;
 	if (!memoBoxImageProbe(evas_object_evas_get(__entryObj), path, &pictureWidth, &pictureHeight, nullptr)) {
 		MEMO_LOGE("This file can not insert to entry.");
@@ -77,7 +84,8 @@ bool MemoBoxItem::insertImages(Eina_List *list)
 	std::string tags = cursorPastLeftEdge(__entryObj) ? "<br/>" : "";
 	Eina_List *l = nullptr;
 	void *data = nullptr;
-	EINA_LIST_FOREACH(list, l, data) {
+	EINA_LIST_FOREACH(list, l, data)
+	{
 		const char *path = static_cast<const char *>(data);
 		if (!path)
 			continue;

@@ -6,46 +6,32 @@
 #include "Box/MemoBoxImageMarkup.h"
 #include "MemoLog.h"
 
-bool MemoBoxItem::removeImageByPath(const char *path)
+bool MemoBoxItem::__eraseImageTag(const char *path, bool (*erase)(std::string &, const char *))
 {
-	if (!path) {
-		MEMO_LOGE("path is null.");
+	if (!__canEditImage(path))
 		return false;
-	}
-	if (!__entryObj) {
-		MEMO_LOGE("__entryObj is NULL");
-		return false;
-	}
-	const int cursor = elm_entry_cursor_pos_get(__entryObj);
 	const char *current = elm_entry_entry_get(__entryObj);
 	std::string markup = current ? current : "";
-	if (!memoBoxImageEraseByPath(markup, path)) {
+	if (!erase(markup, path)) {
 		MEMO_LOGE("Can not find this image");
 		return false;
 	}
 	elm_entry_entry_set(__entryObj, markup.c_str());
+	return true;
+}
+
+bool MemoBoxItem::removeImageByPath(const char *path)
+{
+	const int cursor = __entryObj ? elm_entry_cursor_pos_get(__entryObj) : 0;
+	if (!__eraseImageTag(path, memoBoxImageEraseByPath))
+		return false;
 	elm_entry_cursor_pos_set(__entryObj, cursor + 1);
 	return true;
 }
 
 bool MemoBoxItem::deleteImage(const char *path)
 {
-	if (!path) {
-		MEMO_LOGE("path is null.");
-		return false;
-	}
-	if (!__entryObj) {
-		MEMO_LOGE("__entryObj is NULL");
-		return false;
-	}
-	const char *current = elm_entry_entry_get(__entryObj);
-	std::string markup = current ? current : "";
-	if (!memoBoxImageEraseTag(markup, path)) {
-		MEMO_LOGE("Can not find this image");
-		return false;
-	}
-	elm_entry_entry_set(__entryObj, markup.c_str());
-	return true;
+	return __eraseImageTag(path, memoBoxImageEraseTag);
 }
 
 Eina_List *MemoBoxItem::getImgList()

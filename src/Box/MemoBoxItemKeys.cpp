@@ -8,6 +8,20 @@
 #include "MemoBoxItemPrivate.h"
 #include "MemoLog.h"
 
+namespace
+{
+// Timer body after a mode change has rebuilt the item: the cursor to the end, the focus back.
+bool focusAtEnd(void *data)
+{
+	Evas_Object *entry = static_cast<MemoBoxItem *>(data)->getEntry();
+	if (entry) {
+		elm_entry_cursor_end_set(entry);
+		elm_object_focus_set(entry, EINA_TRUE);
+	}
+	return false;
+}
+} // namespace
+
 void MemoBoxItem::__onEntryActivateCb(void *data, Evas_Object *obj, void *eventInfo)
 {
 	(void)eventInfo;
@@ -34,14 +48,7 @@ void MemoBoxItem::__onCheckReturn()
 		// Return on an empty check line leaves the list.
 		elm_entry_entry_set(entry, nullptr);
 		changeMode();
-		__addTimer([](void *data) {
-			MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
-			if (self->__entryObj) {
-				elm_entry_cursor_end_set(self->__entryObj);
-				elm_object_focus_set(self->__entryObj, EINA_TRUE);
-			}
-			return false;
-		});
+		__addTimer(focusAtEnd);
 		return;
 	}
 
@@ -99,14 +106,7 @@ void MemoBoxItem::__onBackSpaceKey(Evas_Object *entry)
 		} else {
 			evas_object_event_callback_del_full(entry, EVAS_CALLBACK_KEY_DOWN, __onEntryKeyDownCb, this);
 			changeMode();
-			__addTimer([](void *data) {
-				MemoBoxItem *self = static_cast<MemoBoxItem *>(data);
-				if (self->__entryObj) {
-					elm_entry_cursor_end_set(self->__entryObj);
-					elm_object_focus_set(self->__entryObj, EINA_TRUE);
-				}
-				return false;
-			});
+			__addTimer(focusAtEnd);
 		}
 		__lastCursorPos = pos;
 		return;

@@ -4,6 +4,7 @@
 #include <cstring>
 
 #include "MemoLog.h"
+#include "MemoRecordField.h"
 #include "Util/MemoUtil.h"
 
 MemoDocInfo::MemoDocInfo()
@@ -15,23 +16,6 @@ MemoDocInfo::MemoDocInfo()
 }
 
 MemoDocInfo::~MemoDocInfo() {}
-
-// A flag column holds 0 or 1; a negative value fails the test too, as unsigned.
-static bool __isFlag(int value)
-{
-	return static_cast<unsigned int>(value) <= 1;
-}
-
-// Stores a string field, refusing null with the given line.
-#define MEMO_SET_STRING(field, value, message)                                                                         \
-	do {                                                                                                               \
-		if (!(value)) {                                                                                                \
-			MEMO_LOGE(message);                                                                                        \
-			return false;                                                                                              \
-		}                                                                                                              \
-		field = (value);                                                                                               \
-		return true;                                                                                                   \
-	} while (0)
 
 bool MemoDocInfo::setMemoUUID(const char *uuid)
 {
@@ -45,32 +29,22 @@ bool MemoDocInfo::setMemoUUID(const char *uuid)
 
 bool MemoDocInfo::setIsDirty(int isDirty)
 {
-	if (!__isFlag(isDirty)) {
-		MEMO_LOGE("isDirty is Wrong Value");
-		return false;
-	}
-	__isDirty = isDirty;
-	return true;
+	MEMO_RECORD_SET(memoRecordIsFlag(isDirty), __isDirty, isDirty, "isDirty is Wrong Value");
 }
 
 bool MemoDocInfo::setIsDeleted(int isDeleted)
 {
-	if (!__isFlag(isDeleted)) {
-		MEMO_LOGE("isDeleted is Wrong Value");
-		return false;
-	}
-	__isDeleted = isDeleted;
-	return true;
+	MEMO_RECORD_SET(memoRecordIsFlag(isDeleted), __isDeleted, isDeleted, "isDeleted is Wrong Value");
 }
 
 bool MemoDocInfo::setAccountType(const char *accountType)
 {
-	MEMO_SET_STRING(__accountType, accountType, "accountType is NULL");
+	MEMO_RECORD_SET(accountType, __accountType, accountType, "accountType is NULL");
 }
 
 bool MemoDocInfo::setAccountName(const char *accountName)
 {
-	MEMO_SET_STRING(__accountName, accountName, "accountName is NULL");
+	MEMO_RECORD_SET(accountName, __accountName, accountName, "accountName is NULL");
 }
 
 bool MemoDocInfo::setSync1(unsigned long long sync1)
@@ -81,17 +55,12 @@ bool MemoDocInfo::setSync1(unsigned long long sync1)
 
 bool MemoDocInfo::setSync2(const char *sync2)
 {
-	MEMO_SET_STRING(__sync2, sync2, "sync2 is NULL");
+	MEMO_RECORD_SET(sync2, __sync2, sync2, "sync2 is NULL");
 }
 
 bool MemoDocInfo::setIsNeedUpsync(int isNeedUpsync)
 {
-	if (!__isFlag(isNeedUpsync)) {
-		MEMO_LOGE("isNeedUpsync is Wrong Value");
-		return false;
-	}
-	__isNeedUpsync = isNeedUpsync;
-	return true;
+	MEMO_RECORD_SET(memoRecordIsFlag(isNeedUpsync), __isNeedUpsync, isNeedUpsync, "isNeedUpsync is Wrong Value");
 }
 
 bool MemoDocInfo::setCreatedAt(unsigned long long createdAt)
@@ -108,47 +77,47 @@ bool MemoDocInfo::setLastModifiedAt(unsigned long long lastModifiedAt)
 
 bool MemoDocInfo::setCategoryUUID(const char *categoryUUID)
 {
-	MEMO_SET_STRING(__categoryUUID, categoryUUID, "categoryUUID is NULL");
+	MEMO_RECORD_SET(categoryUUID, __categoryUUID, categoryUUID, "categoryUUID is NULL");
 }
 
 bool MemoDocInfo::setTitle(const char *title)
 {
-	MEMO_SET_STRING(__title, title, "title is NULL");
+	MEMO_RECORD_SET(title, __title, title, "title is NULL");
 }
 
 bool MemoDocInfo::setContent(const char *content)
 {
-	MEMO_SET_STRING(__content, content, "content is NULL");
+	MEMO_RECORD_SET(content, __content, content, "content is NULL");
 }
 
 bool MemoDocInfo::setTizenXmlContent(const char *tizenXmlContent)
 {
-	MEMO_SET_STRING(__tizenXmlContent, tizenXmlContent, "tizenXmlContent is NULL");
+	MEMO_RECORD_SET(tizenXmlContent, __tizenXmlContent, tizenXmlContent, "tizenXmlContent is NULL");
 }
 
 bool MemoDocInfo::setAndroidXmlContent(const char *androidXmlContent)
 {
-	MEMO_SET_STRING(__androidXmlContent, androidXmlContent, "androidXmlContent is NULL");
+	MEMO_RECORD_SET(androidXmlContent, __androidXmlContent, androidXmlContent, "androidXmlContent is NULL");
 }
 
 bool MemoDocInfo::setDisplayContent(const char *displayContent)
 {
-	MEMO_SET_STRING(__displayContent, displayContent, "display_Content is NULL");
+	MEMO_RECORD_SET(displayContent, __displayContent, displayContent, "display_Content is NULL");
 }
 
 bool MemoDocInfo::setVrfileUUID(const char *vrfileUUID)
 {
-	MEMO_SET_STRING(__vrfileUUID, vrfileUUID, "vrfileUUID is NULL");
+	MEMO_RECORD_SET(vrfileUUID, __vrfileUUID, vrfileUUID, "vrfileUUID is NULL");
 }
 
 bool MemoDocInfo::setStrippedContent(const char *strippedContent)
 {
-	MEMO_SET_STRING(__strippedContent, strippedContent, "strippedContent is NULL");
+	MEMO_RECORD_SET(strippedContent, __strippedContent, strippedContent, "strippedContent is NULL");
 }
 
 bool MemoDocInfo::setData(const char *data)
 {
-	MEMO_SET_STRING(__data, data, "data is NULL");
+	MEMO_RECORD_SET(data, __data, data, "data is NULL");
 }
 
 bool MemoDocInfo::setPhoneNum(const char *phoneNum)
@@ -180,12 +149,7 @@ bool MemoDocInfo::setIsQuick(int isQuick)
 
 bool MemoDocInfo::setFileCount(int fileCount)
 {
-	if (fileCount < 0) {
-		MEMO_LOGE("fileCount is Wrong Value");
-		return false;
-	}
-	__fileCount = fileCount;
-	return true;
+	MEMO_RECORD_SET(fileCount >= 0, __fileCount, fileCount, "fileCount is Wrong Value");
 }
 
 bool MemoDocInfo::setBgColor(const char *bgColor)

@@ -6,6 +6,7 @@
 #include <Ecore_File.h>
 
 #include "MemoLog.h"
+#include "MemoRecordField.h"
 
 MemoFileInfo::MemoFileInfo() : __isDirty(0), __isDeleted(0), __sync1(0), __isNeedUpsync(0), __size(0), __orientation(0)
 {
@@ -13,60 +14,29 @@ MemoFileInfo::MemoFileInfo() : __isDirty(0), __isDeleted(0), __sync1(0), __isNee
 
 MemoFileInfo::~MemoFileInfo() {}
 
-// A flag column holds 0 or 1; a negative value fails the test too, as unsigned.
-static bool __isFlag(int value)
-{
-	return static_cast<unsigned int>(value) <= 1;
-}
-
 bool MemoFileInfo::setFileUUID(const char *uuid)
 {
-	if (!uuid) {
-		MEMO_LOGE("uuid is NULL");
-		return false;
-	}
-	__fileUUID = uuid;
-	return true;
+	MEMO_RECORD_SET(uuid, __fileUUID, uuid, "uuid is NULL");
 }
 
 bool MemoFileInfo::setIsDirty(int isDirty)
 {
-	if (!__isFlag(isDirty)) {
-		MEMO_LOGE("isDirty is Wrong Value");
-		return false;
-	}
-	__isDirty = isDirty;
-	return true;
+	MEMO_RECORD_SET(memoRecordIsFlag(isDirty), __isDirty, isDirty, "isDirty is Wrong Value");
 }
 
 bool MemoFileInfo::setIsDeleted(int isDeleted)
 {
-	if (!__isFlag(isDeleted)) {
-		MEMO_LOGE("isDeleted is Wrong Value");
-		return false;
-	}
-	__isDeleted = isDeleted;
-	return true;
+	MEMO_RECORD_SET(memoRecordIsFlag(isDeleted), __isDeleted, isDeleted, "isDeleted is Wrong Value");
 }
 
 bool MemoFileInfo::setAccountType(const char *accountType)
 {
-	if (!accountType) {
-		MEMO_LOGE("accountType is NULL");
-		return false;
-	}
-	__accountType = accountType;
-	return true;
+	MEMO_RECORD_SET(accountType, __accountType, accountType, "accountType is NULL");
 }
 
 bool MemoFileInfo::setAccountName(const char *accountName)
 {
-	if (!accountName) {
-		MEMO_LOGE("accountName is NULL");
-		return false;
-	}
-	__accountName = accountName;
-	return true;
+	MEMO_RECORD_SET(accountName, __accountName, accountName, "accountName is NULL");
 }
 
 bool MemoFileInfo::setSync1(unsigned long long sync1)
@@ -77,62 +47,32 @@ bool MemoFileInfo::setSync1(unsigned long long sync1)
 
 bool MemoFileInfo::setSync2(const char *sync2)
 {
-	if (!sync2) {
-		MEMO_LOGE("sync2 is NULL");
-		return false;
-	}
-	__sync2 = sync2;
-	return true;
+	MEMO_RECORD_SET(sync2, __sync2, sync2, "sync2 is NULL");
 }
 
 bool MemoFileInfo::setIsNeedUpsync(int isNeedUpsync)
 {
-	if (!__isFlag(isNeedUpsync)) {
-		MEMO_LOGE("isNeedUpsync is Wrong Value");
-		return false;
-	}
-	__isNeedUpsync = isNeedUpsync;
-	return true;
+	MEMO_RECORD_SET(memoRecordIsFlag(isNeedUpsync), __isNeedUpsync, isNeedUpsync, "isNeedUpsync is Wrong Value");
 }
 
 bool MemoFileInfo::setMemoUUID(const char *memoUUID)
 {
-	if (!memoUUID) {
-		MEMO_LOGE("memoUUID is NULL");
-		return false;
-	}
-	__memoUUID = memoUUID;
-	return true;
+	MEMO_RECORD_SET(memoUUID, __memoUUID, memoUUID, "memoUUID is NULL");
 }
 
 bool MemoFileInfo::setMimeType(const char *mimeType)
 {
-	if (!mimeType) {
-		MEMO_LOGE("mimeType is NULL");
-		return false;
-	}
-	__mimeType = mimeType;
-	return true;
+	MEMO_RECORD_SET(mimeType, __mimeType, mimeType, "mimeType is NULL");
 }
 
 bool MemoFileInfo::setDisplayName(const char *displayName)
 {
-	if (!displayName) {
-		MEMO_LOGE("displayName is NULL");
-		return false;
-	}
-	__displayName = displayName;
-	return true;
+	MEMO_RECORD_SET(displayName, __displayName, displayName, "displayName is NULL");
 }
 
 bool MemoFileInfo::setSize(long long size)
 {
-	if (size < 0) {
-		MEMO_LOGE("size is Wrong Value");
-		return false;
-	}
-	__size = size;
-	return true;
+	MEMO_RECORD_SET(size >= 0, __size, size, "size is Wrong Value");
 }
 
 bool MemoFileInfo::setOrientation(int orientation)
@@ -143,12 +83,7 @@ bool MemoFileInfo::setOrientation(int orientation)
 
 bool MemoFileInfo::setData(const char *data)
 {
-	if (!data) {
-		MEMO_LOGE("data is NULL");
-		return false;
-	}
-	__data = data;
-	return true;
+	MEMO_RECORD_SET(data, __data, data, "data is NULL");
 }
 
 bool MemoFileInfo::setPath(const char *path)

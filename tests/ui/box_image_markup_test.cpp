@@ -6,21 +6,18 @@
 
 TEST(BoxImageSize, WidthsFollowTheExactScale)
 {
-	int w = 0, h = 0;
-	memoBoxImageTextSize(1.8, &w, &h);
-	EXPECT_EQ(603, w);
-	EXPECT_EQ(428, h);
-	memoBoxImageTextSize(3.8, &w, &h);
-	EXPECT_EQ(653, w);
-	memoBoxImageTextSize(1.81, &w, &h);
-	EXPECT_EQ(628, w);
-	memoBoxImageCheckSize(1.8, &w, &h);
-	EXPECT_EQ(506, w);
-	EXPECT_EQ(392, h);
-	memoBoxImageCheckSize(3.8, &w, &h);
-	EXPECT_EQ(560, w);
-	memoBoxImageCheckSize(2.6, &w, &h);
-	EXPECT_EQ(521, w);
+	auto expectSize = [](void (*size)(double, int *, int *), double scale, int width, int defaultHeight) {
+		int w = 0, h = 0;
+		size(scale, &w, &h);
+		EXPECT_EQ(width, w) << scale;
+		EXPECT_EQ(defaultHeight, h) << scale;
+	};
+	expectSize(memoBoxImageTextSize, 1.8, 603, 428);
+	expectSize(memoBoxImageTextSize, 3.8, 653, 428);
+	expectSize(memoBoxImageTextSize, 1.81, 628, 428);
+	expectSize(memoBoxImageCheckSize, 1.8, 506, 392);
+	expectSize(memoBoxImageCheckSize, 3.8, 560, 392);
+	expectSize(memoBoxImageCheckSize, 2.6, 521, 392);
 }
 
 TEST(BoxImageSize, HeightKeepsTheProportionsPlusRoom)
@@ -36,17 +33,17 @@ TEST(BoxImageSize, HeightKeepsTheProportionsPlusRoom)
 TEST(BoxImageSize, TagTemplates)
 {
 	EXPECT_EQ("<item size=603x341 vsize=full href=file:///m/a.jpg></item><br/>",
-			  memoBoxImageTag(603, 341, "/m/a.jpg", false));
+	          memoBoxImageTag(603, 341, "/m/a.jpg", false));
 	EXPECT_EQ("<br/><item size=603x341 vsize=full href=file:///m/a.jpg></item><br/>",
-			  memoBoxImageTag(603, 341, "/m/a.jpg", true));
+	          memoBoxImageTag(603, 341, "/m/a.jpg", true));
 	EXPECT_EQ(2047u, memoBoxImageTag(1, 1, std::string(3000, 'p').c_str(), false).size());
 }
 
 TEST(BoxImageMarkup, PathsInOrder)
 {
 	const std::string markup = "a<br/><item size=603x341 vsize=full href=file:///m/one.jpg></item><br/>"
-							   "b<item size=1x1 href=file:///m/two.png></item>"
-							   "<item size=1x1 href=file:///m/open.png>";
+	                           "b<item size=1x1 href=file:///m/two.png></item>"
+	                           "<item size=1x1 href=file:///m/open.png>";
 	const std::vector<std::string> paths = memoBoxImagePaths(markup.c_str());
 	ASSERT_EQ(2u, paths.size());
 	EXPECT_EQ("/m/one.jpg", paths[0]);

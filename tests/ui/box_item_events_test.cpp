@@ -10,39 +10,20 @@
 #include "Model/MemoBroadCaster.h"
 #include "TestEnv.h"
 #include "Util/MemoUtil.h"
-#include "support/FakeBoxOwner.h"
-#include "support/UiTestSupport.h"
+#include "support/BoxItemFixture.h"
 
 using namespace memo_ui_test;
 
 namespace
 {
-class BoxItemEventsTest : public UiFixture
+class BoxItemEventsTest : public BoxItemFixture
 {
 protected:
-	void SetUp() override
-	{
-		UiFixture::SetUp();
-		owner = new FakeBoxOwner(box);
-	}
-	void TearDown() override
-	{
-		delete owner;
-		UiFixture::TearDown();
-	}
-
-	static std::string text(MemoBoxItem *item)
-	{
-		const char *t = elm_entry_entry_get(item->getEntry());
-		return t ? t : "";
-	}
 	static std::string guide(MemoBoxItem *item)
 	{
 		const char *t = elm_object_part_text_get(item->getEntry(), "elm.guide");
 		return t ? t : "";
 	}
-
-	FakeBoxOwner *owner = nullptr;
 };
 } // namespace
 

@@ -1,27 +1,15 @@
 // Return and BackSpace on every kind of box item, with real key events.
 #include <gtest/gtest.h>
 
-#include "support/FakeBoxOwner.h"
-#include "support/UiTestSupport.h"
+#include "support/BoxItemFixture.h"
 
 using namespace memo_ui_test;
 
 namespace
 {
-class BoxItemKeysTest : public UiFixture
+class BoxItemKeysTest : public BoxItemFixture
 {
 protected:
-	void SetUp() override
-	{
-		UiFixture::SetUp();
-		owner = new FakeBoxOwner(box);
-	}
-	void TearDown() override
-	{
-		delete owner;
-		UiFixture::TearDown();
-	}
-
 	// An item with `markup` in it, focused, the cursor at `cursor` (-1: the end).
 	MemoBoxItem *itemWith(_MemoBoxItemType type, const char *markup, int cursor = -1)
 	{
@@ -37,14 +25,6 @@ protected:
 		owner->calls.clear();
 		return item;
 	}
-
-	static std::string text(MemoBoxItem *item)
-	{
-		const char *t = elm_entry_entry_get(item->getEntry());
-		return t ? t : "";
-	}
-
-	FakeBoxOwner *owner = nullptr;
 };
 } // namespace
 

@@ -4,39 +4,21 @@
 #include <Ecore_File.h>
 
 #include "Util/MemoUtil.h"
-#include "support/FakeBoxOwner.h"
-#include "support/UiTestSupport.h"
+#include "support/BoxItemFixture.h"
 
 using namespace memo_ui_test;
 
 namespace
 {
-class BoxItemModeTest : public UiFixture
+class BoxItemModeTest : public BoxItemFixture
 {
 protected:
-	void SetUp() override
-	{
-		UiFixture::SetUp();
-		owner = new FakeBoxOwner(box);
-	}
-	void TearDown() override
-	{
-		delete owner;
-		UiFixture::TearDown();
-	}
-
 	MemoBoxItem *itemWith(_MemoBoxItemType type, const char *markup, int cursor)
 	{
 		MemoBoxItem *item = owner->addItem(type);
 		item->insertText(markup);
 		elm_entry_cursor_pos_set(item->getEntry(), cursor);
 		return item;
-	}
-
-	static std::string text(MemoBoxItem *item)
-	{
-		const char *t = elm_entry_entry_get(item->getEntry());
-		return t ? t : "";
 	}
 
 	// The kinds and texts of the owner's items, e.g. "0:l1 1:l2 0:l3".
@@ -47,25 +29,36 @@ protected:
 			out += (out.empty() ? "" : " ") + std::to_string(item->getType()) + ":" + text(item);
 		return out;
 	}
-
-	FakeBoxOwner *owner = nullptr;
 };
 } // namespace
 
-TEST_F(BoxItemModeTest, CursorAtTheStartOfTheMiddleLineGivesTextCheckText)
+TEST_F(BoxItemModeTest, SplitsAtTheCursor)
 {
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_FIRST_TEXT, "l1<br/>l2<br/>l3", 3);
-	item->changeMode();
-	runFor(0.05);
-	EXPECT_EQ("5:l1 1:l2 0:l3", shape());
-}
-
-TEST_F(BoxItemModeTest, CursorInsideAWordSplitsTheWord)
-{
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_TEXT, "abcd", 2);
-	item->changeMode();
-	runFor(0.05);
-	EXPECT_EQ("0:ab 1:cd", shape());
+	struct Case {
+		_MemoBoxItemType type;
+		const char *markup;
+		int cursor;
+		const char *shape;
+	};
+	const Case cases[] = {
+	    // The start of the middle line: text, check, text.
+	    {MEMO_BOX_ITEM_FIRST_TEXT, "l1<br/>l2<br/>l3", 3, "5:l1 1:l2 0:l3"},
+	    // Inside a word the word is split.
+	    {MEMO_BOX_ITEM_TEXT, "abcd", 2, "0:ab 1:cd"},
+	    // The start or the end of several lines takes the first or the last line.
+	    {MEMO_BOX_ITEM_TEXT, "l1<br/>l2", 0, "1:l1 0:l2"},
+	    {MEMO_BOX_ITEM_TEXT, "l1<br/>l2", 5, "0:l1 1:l2"},
+	    // Format tags are lost, entities kept.
+	    {MEMO_BOX_ITEM_TEXT, "a&amp;b<br/>c&lt;d", 4, "0:a&amp;b 1:c&lt;d"},
+	};
+	for (const Case &c : cases) {
+		SCOPED_TRACE(c.markup);
+		delete owner;
+		owner = new FakeBoxOwner(box);
+		itemWith(c.type, c.markup, c.cursor)->changeMode();
+		runFor(0.05);
+		EXPECT_EQ(c.shape, shape());
+	}
 }
 
 TEST_F(BoxItemModeTest, OneLineWithTheCursorAtAnEdgeTurnsWhole)
@@ -82,35 +75,11 @@ TEST_F(BoxItemModeTest, OneLineWithTheCursorAtAnEdgeTurnsWhole)
 	EXPECT_EQ("2:abcd", shape());
 }
 
-TEST_F(BoxItemModeTest, CursorAtTheStartOfSeveralLinesTakesTheFirstLine)
-{
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_TEXT, "l1<br/>l2", 0);
-	item->changeMode();
-	runFor(0.05);
-	EXPECT_EQ("1:l1 0:l2", shape());
-}
-
-TEST_F(BoxItemModeTest, CursorAtTheEndOfSeveralLinesTakesTheLastLine)
-{
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_TEXT, "l1<br/>l2", 5);
-	item->changeMode();
-	runFor(0.05);
-	EXPECT_EQ("0:l1 1:l2", shape());
-}
-
 TEST_F(BoxItemModeTest, QuickMemoBodyBecomesAPlainCheck)
 {
 	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_QUICK_TEXT, "note", 4);
 	item->changeMode();
 	EXPECT_EQ(MEMO_BOX_ITEM_CHECK, item->getType());
-}
-
-TEST_F(BoxItemModeTest, FormatTagsAreLostAndEntitiesKept)
-{
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_TEXT, "a&amp;b<br/>c&lt;d", 4);
-	item->changeMode();
-	runFor(0.05);
-	EXPECT_EQ("0:a&amp;b 1:c&lt;d", shape());
 }
 
 TEST_F(BoxItemModeTest, ImageTagsGoBackWhereTheyStood)

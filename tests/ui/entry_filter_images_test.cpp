@@ -52,6 +52,15 @@ protected:
 		return markup.substr(start, markup.find('>', start) - start);
 	}
 
+	// The tag this display gives a picture of pictureW x pictureH at `path`.
+	std::string fittedTag(const std::string &path, int pictureW, int pictureH) const
+	{
+		char tag[512];
+		snprintf(tag, sizeof(tag), "<item size=%dx%d vsize=full href=file://%s></item>", width,
+		         pictureH * width / pictureW + 40, path.c_str());
+		return tag;
+	}
+
 	bool pictureSize(const std::string &path, int *w, int *h)
 	{
 		Evas_Object *img = evas_object_image_add(evas());
@@ -73,10 +82,7 @@ TEST_F(EntryFilterImagesTest, ATagFromAnotherMemoIsCopiedIn)
 {
 	const std::string source = elsewhere + "photo.png";
 	ASSERT_TRUE(writePicture(source, 200, 100));
-	char tag[512];
-	snprintf(tag, sizeof(tag), "<item size=%dx%d vsize=full href=file://%s></item>", width, 100 * width / 200 + 40,
-	         source.c_str());
-	item->insertText(tag);
+	item->insertText(fittedTag(source, 200, 100).c_str());
 
 	const std::string path = pathOf(text());
 	ASSERT_EQ(0u, path.find(folder)) << text();
@@ -98,10 +104,7 @@ TEST_F(EntryFilterImagesTest, AForeignWidthIsFittedToThisDisplay)
 	const std::string source = folder + "wide.png";
 	ASSERT_TRUE(writePicture(source, 200, 100));
 	item->insertText(("<item size=100x90 vsize=full href=file://" + source + "></item>").c_str());
-	char expected[512];
-	snprintf(expected, sizeof(expected), "<item size=%dx%d vsize=full href=file://%s></item>", width,
-	         100 * width / 200 + 40, source.c_str());
-	EXPECT_EQ(expected, text());
+	EXPECT_EQ(fittedTag(source, 200, 100), text());
 }
 
 TEST_F(EntryFilterImagesTest, APasteOfTheFixedSizeIsRebuilt)
@@ -113,10 +116,7 @@ TEST_F(EntryFilterImagesTest, APasteOfTheFixedSizeIsRebuilt)
 	const std::string path = pathOf(text());
 	ASSERT_EQ(0u, path.find(folder)) << text();
 	EXPECT_TRUE(eina_str_has_extension(path.c_str(), ".jpg"));
-	char expected[512];
-	snprintf(expected, sizeof(expected), "a<item size=%dx%d vsize=full href=file://%s></item>b", width,
-	         200 * width / 300 + 40, path.c_str());
-	EXPECT_EQ(expected, text());
+	EXPECT_EQ("a" + fittedTag(path, 300, 200) + "b", text());
 }
 
 TEST_F(EntryFilterImagesTest, APasteOfAMissingFileStaysAsItIs)
@@ -154,10 +154,7 @@ TEST_F(EntryFilterImagesTest, ALargePictureFromElsewhereEntersAtOnce)
 {
 	const std::string source = elsewhere + "big.jpg";
 	ASSERT_TRUE(writePicture(source, 1000, 800));
-	char tag[512];
-	snprintf(tag, sizeof(tag), "<item size=%dx%d vsize=full href=file://%s></item>", width, 800 * width / 1000 + 40,
-	         source.c_str());
-	item->insertText(tag);
+	item->insertText(fittedTag(source, 1000, 800).c_str());
 	const std::string path = pathOf(text());
 	ASSERT_EQ(0u, path.find(folder)) << text();
 	EXPECT_EQ(0, owner->count("popup:"));

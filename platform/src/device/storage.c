@@ -72,7 +72,8 @@ int storage_get_internal_memory_size64(struct statvfs *buf)
 	return __internal_size(buf);
 }
 
-int storage_get_available_space(int storage_id, unsigned long long *bytes)
+/* The free (`total` false) or total bytes of the internal storage. */
+static int __space(int storage_id, unsigned long long *bytes, bool total)
 {
 	if (!bytes)
 		return STORAGE_ERROR_INVALID_PARAMETER;
@@ -81,19 +82,17 @@ int storage_get_available_space(int storage_id, unsigned long long *bytes)
 	struct statvfs buf;
 	int ret = __internal_size(&buf);
 	if (ret == STORAGE_ERROR_NONE)
-		*bytes = (unsigned long long)buf.f_bsize * buf.f_bavail;
+		*bytes =
+		    total ? (unsigned long long)buf.f_frsize * buf.f_blocks : (unsigned long long)buf.f_bsize * buf.f_bavail;
 	return ret;
+}
+
+int storage_get_available_space(int storage_id, unsigned long long *bytes)
+{
+	return __space(storage_id, bytes, false);
 }
 
 int storage_get_total_space(int storage_id, unsigned long long *bytes)
 {
-	if (!bytes)
-		return STORAGE_ERROR_INVALID_PARAMETER;
-	if (storage_id != STORAGE_TYPE_INTERNAL)
-		return STORAGE_ERROR_NOT_SUPPORTED;
-	struct statvfs buf;
-	int ret = __internal_size(&buf);
-	if (ret == STORAGE_ERROR_NONE)
-		*bytes = (unsigned long long)buf.f_frsize * buf.f_blocks;
-	return ret;
+	return __space(storage_id, bytes, true);
 }

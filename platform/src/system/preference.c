@@ -9,20 +9,8 @@
 #include <app_common.h>
 #include <dlog.h>
 
-#include "system/dir_watch.h"
 #include "system/key_file_store.h"
-
-typedef struct pref_watcher_s {
-	char *key;
-	preference_changed_cb cb;
-	void *user_data;
-	bool removed; /* unset while callbacks were running; unlinked afterwards */
-	struct pref_watcher_s *next;
-} pref_watcher_t;
-
-static pref_watcher_t *__watchers;
-static dir_watch_t *__watch;
-static int __dispatchDepth;
+#include "system/key_watch.h"
 
 /* "<data path>.pref/", malloc'ed; NULL (logged) when the data path is unknown. */
 static char *__prefDirN(void)
@@ -72,9 +60,12 @@ static int __set(const char *key, const key_file_value_t *value)
 	return __errorOf(rc);
 }
 
-/* Reads key expecting the given type; the caller clears *value on success. */
-static int __get(const char *key, key_file_type_e type, key_file_value_t *value)
+/* Reads key expecting the given type into *value; `out` is the caller's result, which must not be
+   NULL. The caller clears *value on success. */
+static int __get(const char *key, key_file_type_e type, const void *out, key_file_value_t *value)
 {
+	if (!out)
+		return PREFERENCE_ERROR_INVALID_PARAMETER;
 	if (!key || !key[0]) {
 		LOGE("invalid key");
 		return PREFERENCE_ERROR_INVALID_PARAMETER;
@@ -124,10 +115,8 @@ int preference_set_boolean(const char *key, bool value)
 
 int preference_get_int(const char *key, int *value)
 {
-	if (!value)
-		return PREFERENCE_ERROR_INVALID_PARAMETER;
 	key_file_value_t v;
-	int rc = __get(key, KEY_FILE_TYPE_INT, &v);
+	int rc = __get(key, KEY_FILE_TYPE_INT, value, &v);
 	if (rc == PREFERENCE_ERROR_NONE)
 		*value = v.i;
 	return rc;
@@ -135,10 +124,8 @@ int preference_get_int(const char *key, int *value)
 
 int preference_get_double(const char *key, double *value)
 {
-	if (!value)
-		return PREFERENCE_ERROR_INVALID_PARAMETER;
 	key_file_value_t v;
-	int rc = __get(key, KEY_FILE_TYPE_DOUBLE, &v);
+	int rc = __get(key, KEY_FILE_TYPE_DOUBLE, value, &v);
 	if (rc == PREFERENCE_ERROR_NONE)
 		*value = v.d;
 	return rc;
@@ -146,10 +133,8 @@ int preference_get_double(const char *key, double *value)
 
 int preference_get_string(const char *key, char **value)
 {
-	if (!value)
-		return PREFERENCE_ERROR_INVALID_PARAMETER;
 	key_file_value_t v;
-	int rc = __get(key, KEY_FILE_TYPE_STRING, &v);
+	int rc = __get(key, KEY_FILE_TYPE_STRING, value, &v);
 	if (rc == PREFERENCE_ERROR_NONE)
 		*value = v.s; /* ownership passes to the caller */
 	return rc;
@@ -157,10 +142,8 @@ int preference_get_string(const char *key, char **value)
 
 int preference_get_boolean(const char *key, bool *value)
 {
-	if (!value)
-		return PREFERENCE_ERROR_INVALID_PARAMETER;
 	key_file_value_t v;
-	int rc = __get(key, KEY_FILE_TYPE_BOOL, &v);
+	int rc = __get(key, KEY_FILE_TYPE_BOOL, value, &v);
 	if (rc == PREFERENCE_ERROR_NONE)
 		*value = v.i != 0;
 	return rc;
@@ -246,49 +229,13 @@ int preference_foreach_item(preference_item_cb callback, void *user_data)
 	return __errorOf(rc);
 }
 
-static pref_watcher_t *__findWatcher(const char *key)
+static bool __deliverCb(key_watcher_t *watcher, const char *key)
 {
-	for (pref_watcher_t *w = __watchers; w; w = w->next)
-		if (!w->removed && !strcmp(w->key, key))
-			return w;
-	return NULL;
+	((preference_changed_cb)watcher->cb)(key, watcher->user_data);
+	return true;
 }
 
-/* Unlinks watchers unset during dispatch, and stops the folder watch once none is left. */
-static void __sweepWatchers(void)
-{
-	if (__dispatchDepth > 0)
-		return;
-	pref_watcher_t **link = &__watchers;
-	while (*link) {
-		pref_watcher_t *w = *link;
-		if (w->removed) {
-			*link = w->next;
-			free(w->key);
-			free(w);
-		} else {
-			link = &w->next;
-		}
-	}
-	if (!__watchers && __watch) {
-		dir_watch_free(__watch);
-		__watch = NULL;
-	}
-}
-
-static void __keyChangedCb(const char *key, dir_watch_event_e event, void *data)
-{
-	(void)data;
-	/* A removal is no value to report; the registration stays for when the key comes back. */
-	if (event != DIR_WATCH_CHANGED)
-		return;
-	__dispatchDepth++;
-	for (pref_watcher_t *w = __watchers; w; w = w->next)
-		if (!w->removed && !strcmp(w->key, key))
-			w->cb(key, w->user_data);
-	__dispatchDepth--;
-	__sweepWatchers();
-}
+static key_watch_list_t __watches = {.deliver = __deliverCb};
 
 int preference_set_changed_cb(const char *key, preference_changed_cb callback, void *user_data)
 {
@@ -302,25 +249,15 @@ int preference_set_changed_cb(const char *key, preference_changed_cb callback, v
 		LOGE("%s does not exist", key);
 		return PREFERENCE_ERROR_NO_KEY;
 	}
-	if (!__watch) {
-		char *dir = __prefDirN();
-		__watch = dir ? dir_watch_new(dir, __keyChangedCb, NULL) : NULL;
-		free(dir);
-		if (!__watch)
-			return PREFERENCE_ERROR_IO_ERROR;
-	}
-	pref_watcher_t *w = __findWatcher(key);
-	if (!w) {
-		w = calloc(1, sizeof(*w));
-		if (!w || !(w->key = strdup(key))) {
-			free(w);
-			__sweepWatchers();
-			return PREFERENCE_ERROR_OUT_OF_MEMORY;
-		}
-		w->next = __watchers;
-		__watchers = w;
-	}
-	w->cb = callback;
+	if (!key_watch_start(&__watches, __prefDirN))
+		return PREFERENCE_ERROR_IO_ERROR;
+	/* One callback per key: a second registration replaces the first. */
+	key_watcher_t *w = key_watch_find(&__watches, key);
+	if (!w)
+		w = key_watch_add(&__watches, key, NULL, NULL);
+	if (!w)
+		return PREFERENCE_ERROR_OUT_OF_MEMORY;
+	w->cb = (key_watch_fn)callback;
 	w->user_data = user_data;
 	return PREFERENCE_ERROR_NONE;
 }
@@ -329,8 +266,7 @@ int preference_unset_changed_cb(const char *key)
 {
 	if (!key || !key[0])
 		return PREFERENCE_ERROR_INVALID_PARAMETER;
-	pref_watcher_t *w = __findWatcher(key);
-	if (!w) {
+	if (!key_watch_remove(&__watches, key, NULL)) {
 		bool existing = false;
 		int rc = preference_is_existing(key, &existing);
 		if (rc != PREFERENCE_ERROR_NONE)
@@ -338,7 +274,5 @@ int preference_unset_changed_cb(const char *key)
 		LOGE("no callback on %s", key);
 		return existing ? PREFERENCE_ERROR_IO_ERROR : PREFERENCE_ERROR_NO_KEY;
 	}
-	w->removed = true;
-	__sweepWatchers();
 	return PREFERENCE_ERROR_NONE;
 }

@@ -86,6 +86,12 @@ static int __lookup(system_settings_key_e key, setting_kind_e kind, const settin
 	return SYSTEM_SETTINGS_ERROR_NONE;
 }
 
+/* As __lookup, for the operations that take a pointer: a NULL one is an invalid parameter. */
+static int __lookupWith(const void *ptr, system_settings_key_e key, setting_kind_e kind, const setting_def_t **def)
+{
+	return ptr ? __lookup(key, kind, def) : SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER;
+}
+
 /* "de_DE.UTF-8" -> "de_DE", malloc'ed. */
 static char *__withoutCodesetN(const char *locale)
 {
@@ -122,9 +128,7 @@ static char *__hostTimezoneN(void)
 int system_settings_get_value_string(system_settings_key_e key, char **value)
 {
 	const setting_def_t *def = NULL;
-	if (!value)
-		return SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER;
-	int rc = __lookup(key, SETTING_STRING, &def);
+	int rc = __lookupWith(value, key, SETTING_STRING, &def);
 	if (rc != SYSTEM_SETTINGS_ERROR_NONE)
 		return rc;
 	char *stored = def->vconfKey ? vconf_get_str(def->vconfKey) : NULL;
@@ -154,9 +158,7 @@ int system_settings_get_value_string(system_settings_key_e key, char **value)
 int system_settings_get_value_int(system_settings_key_e key, int *value)
 {
 	const setting_def_t *def = NULL;
-	if (!value)
-		return SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER;
-	int rc = __lookup(key, SETTING_INT, &def);
+	int rc = __lookupWith(value, key, SETTING_INT, &def);
 	if (rc != SYSTEM_SETTINGS_ERROR_NONE)
 		return rc;
 	int stored = SYSTEM_SETTINGS_FONT_SIZE_NORMAL;
@@ -168,9 +170,7 @@ int system_settings_get_value_int(system_settings_key_e key, int *value)
 int system_settings_get_value_bool(system_settings_key_e key, bool *value)
 {
 	const setting_def_t *def = NULL;
-	if (!value)
-		return SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER;
-	int rc = __lookup(key, SETTING_BOOL, &def);
+	int rc = __lookupWith(value, key, SETTING_BOOL, &def);
 	if (rc != SYSTEM_SETTINGS_ERROR_NONE)
 		return rc;
 	if (key == SYSTEM_SETTINGS_KEY_LOCALE_TIMEFORMAT_24HOUR) {
@@ -193,9 +193,7 @@ static int __vconfResult(int rc)
 int system_settings_set_value_string(system_settings_key_e key, const char *value)
 {
 	const setting_def_t *def = NULL;
-	if (!value)
-		return SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER;
-	int rc = __lookup(key, SETTING_STRING, &def);
+	int rc = __lookupWith(value, key, SETTING_STRING, &def);
 	if (rc != SYSTEM_SETTINGS_ERROR_NONE)
 		return rc;
 	if (!def->vconfKey || key == SYSTEM_SETTINGS_KEY_LOCALE_TIMEZONE)

@@ -8,21 +8,9 @@
 
 #include <dlog.h>
 
-#include "system/dir_watch.h"
 #include "system/key_file_store.h"
+#include "system/key_watch.h"
 #include "system/vconf_store.h"
-
-typedef struct vconf_watcher_s {
-	char *key;
-	vconf_callback_fn cb;
-	void *user_data;
-	bool removed; /* ignored while callbacks were running; unlinked afterwards */
-	struct vconf_watcher_s *next;
-} vconf_watcher_t;
-
-static vconf_watcher_t *__watchers;
-static dir_watch_t *__watch;
-static int __dispatchDepth;
 
 static int __set(const char *key, const key_file_value_t *value)
 {
@@ -226,48 +214,20 @@ static bool __fillNode(const char *key, keynode_t *node, key_file_value_t *value
 	return true;
 }
 
-/* Unlinks watchers ignored during dispatch, and stops the folder watch once none is left. */
-static void __sweepWatchers(void)
+/* A fresh node per callback: a callback may keep nothing, nor spoil the next one's copy. Stops the
+   dispatch when the key cannot be read (removed again meanwhile). */
+static bool __deliverCb(key_watcher_t *watcher, const char *key)
 {
-	if (__dispatchDepth > 0)
-		return;
-	vconf_watcher_t **link = &__watchers;
-	while (*link) {
-		vconf_watcher_t *w = *link;
-		if (w->removed) {
-			*link = w->next;
-			free(w->key);
-			free(w);
-		} else {
-			link = &w->next;
-		}
-	}
-	if (!__watchers && __watch) {
-		dir_watch_free(__watch);
-		__watch = NULL;
-	}
+	keynode_t node;
+	key_file_value_t value;
+	if (!__fillNode(key, &node, &value))
+		return false;
+	((vconf_callback_fn)watcher->cb)(&node, watcher->user_data);
+	key_file_value_clear(&value);
+	return true;
 }
 
-static void __keyChangedCb(const char *key, dir_watch_event_e event, void *data)
-{
-	(void)data;
-	if (event != DIR_WATCH_CHANGED)
-		return;
-	__dispatchDepth++;
-	for (vconf_watcher_t *w = __watchers; w; w = w->next) {
-		if (w->removed || strcmp(w->key, key))
-			continue;
-		/* A fresh node per callback: a callback may keep nothing, nor spoil the next one's copy. */
-		keynode_t node;
-		key_file_value_t value;
-		if (!__fillNode(key, &node, &value))
-			break;
-		w->cb(&node, w->user_data);
-		key_file_value_clear(&value);
-	}
-	__dispatchDepth--;
-	__sweepWatchers();
-}
+static key_watch_list_t __watches = {.deliver = __deliverCb};
 
 int vconf_notify_key_changed(const char *in_key, vconf_callback_fn cb, void *user_data)
 {
@@ -275,44 +235,18 @@ int vconf_notify_key_changed(const char *in_key, vconf_callback_fn cb, void *use
 		LOGE("invalid key or callback");
 		return VCONF_ERROR;
 	}
-	if (!__watch) {
-		char *dir = vconf_store_dir_n();
-		__watch = dir ? dir_watch_new(dir, __keyChangedCb, NULL) : NULL;
-		free(dir);
-		if (!__watch)
-			return VCONF_ERROR;
-	}
-	vconf_watcher_t *w = calloc(1, sizeof(*w));
-	if (!w || !(w->key = strdup(in_key))) {
-		free(w);
-		__sweepWatchers();
+	if (!key_watch_start(&__watches, vconf_store_dir_n))
 		return VCONF_ERROR;
-	}
-	w->cb = cb;
-	w->user_data = user_data;
-	/* Appended, so callbacks run in the order they were added. */
-	vconf_watcher_t **link = &__watchers;
-	while (*link)
-		link = &(*link)->next;
-	*link = w;
-	return VCONF_OK;
+	return key_watch_add(&__watches, in_key, (key_watch_fn)cb, user_data) ? VCONF_OK : VCONF_ERROR;
 }
 
 int vconf_ignore_key_changed(const char *in_key, vconf_callback_fn cb)
 {
 	if (!in_key || !cb)
 		return VCONF_ERROR;
-	bool found = false;
-	for (vconf_watcher_t *w = __watchers; w; w = w->next) {
-		if (!w->removed && w->cb == cb && !strcmp(w->key, in_key)) {
-			w->removed = true;
-			found = true;
-		}
-	}
-	if (!found) {
+	if (!key_watch_remove(&__watches, in_key, (key_watch_fn)cb)) {
 		LOGE("no callback on %s", in_key);
 		return VCONF_ERROR;
 	}
-	__sweepWatchers();
 	return VCONF_OK;
 }
