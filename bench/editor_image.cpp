@@ -19,15 +19,14 @@
 #include <cstdlib>
 #include <cstring>
 #include <string>
-#include <sys/stat.h>
 #include <time.h>
-#include <unistd.h>
 #include <vector>
 
 #include "Box/MemoBoxControl.h"
 #include "Box/MemoBoxItem.h"
 #include "Util/MemoUtil.h"
 
+#include "BenchEnv.h"
 #include "BenchPhoto.h"
 
 using namespace memo_bench;
@@ -49,52 +48,6 @@ double threadCpuTime()
 	timespec ts = {};
 	clock_gettime(CLOCK_THREAD_CPUTIME_ID, &ts);
 	return ts.tv_sec + ts.tv_nsec / 1e9;
-}
-
-void setDir(const char *var, const std::string &path)
-{
-	mkdir(path.c_str(), 0700);
-	setenv(var, path.c_str(), 1);
-}
-
-// The same surroundings as the tests: a private root for every store, the app's resources from the
-// build tree, a headless canvas.
-bool setUpEnvironment()
-{
-	char tmpl[] = "/tmp/memo-bench-editor-XXXXXX";
-	if (!mkdtemp(tmpl)) {
-		perror("mkdtemp");
-		return false;
-	}
-	gRoot = tmpl;
-	setDir("HOME", gRoot + "/home");
-	setDir("XDG_DATA_HOME", gRoot + "/xdg-data");
-	setDir("XDG_CONFIG_HOME", gRoot + "/xdg-config");
-	setDir("XDG_RUNTIME_DIR", gRoot + "/xdg-runtime");
-	setDir("TIZEN_APP_ROOT", gRoot + "/app");
-	setDir("TIZEN_VCONF_DIR", gRoot + "/vconf");
-	setenv("TIZEN_APP_ID", "com.veltron.memo", 1);
-	if (!getenv("TIZEN_APP_RES_DIR")) {
-		// <build>/bench/bench_editor_image -> <build>/app/res/
-		char exe[4096] = {};
-		const ssize_t len = readlink("/proc/self/exe", exe, sizeof(exe) - 1);
-		if (len > 0) {
-			std::string dir(exe, static_cast<size_t>(len));
-			dir = dir.substr(0, dir.rfind('/'));
-			dir = dir.substr(0, dir.rfind('/'));
-			setenv("TIZEN_APP_RES_DIR", (dir + "/app/res/").c_str(), 1);
-		}
-	}
-	setenv("ELM_ENGINE", "buffer", 1);
-	setenv("ELM_DISPLAY", "buffer", 1);
-	setenv("ECORE_EVAS_ENGINE", "buffer", 1);
-	setenv("ECORE_NO_SYSTEM_MODULES", "1", 1);
-	setenv("EINA_LOG_BACKTRACE", "0", 1);
-	// Errors only: the info lines of the filter would be timed with it.
-	setenv("DLOG_LEVEL", "6", 1);
-	unsetenv("DISPLAY");
-	unsetenv("WAYLAND_DISPLAY");
-	return true;
 }
 
 enum InsertKind { TYPING, PASTE, GALLERY };
@@ -269,7 +222,8 @@ void printRow(const char *kind, int run, const RunResult &r)
 int main(int argc, char **argv)
 {
 	const int runs = argc > 1 ? std::max(1, atoi(argv[1])) : 5;
-	if (!setUpEnvironment())
+	gRoot = setUpPrivateRoot("editor");
+	if (gRoot.empty())
 		return 2;
 	elm_init(argc, argv);
 	// Ecore may put a timer off by up to its precision (10 ms by default) to wake less often; the

@@ -14,6 +14,7 @@
 #include <string>
 #include <vector>
 
+#include "BenchEnv.h"
 #include "BenchPhoto.h"
 
 using namespace memo_bench;
@@ -102,18 +103,10 @@ BENCHMARK(BM_Decode12MP)->Arg(IMAGE_UTIL_DOWNSCALE_1_1)->Arg(IMAGE_UTIL_DOWNSCAL
 
 int main(int argc, char **argv)
 {
-	char tmpl[] = "/tmp/memo-bench-image-XXXXXX";
-	if (!mkdtemp(tmpl)) {
-		perror("mkdtemp");
+	gDir = setUpPrivateRoot("image");
+	if (gDir.empty())
 		return 2;
-	}
-	gDir = tmpl;
 	gPhoto = gDir + "/photo.jpg";
-	// Keep the log off the timings and out of the user's data folder.
-	setenv("TIZEN_APP_ROOT", gDir.c_str(), 1);
-	setenv("DLOG_LEVEL", "6", 1);
-	setenv("ECORE_NO_SYSTEM_MODULES", "1", 1);
-	setenv("EINA_LOG_BACKTRACE", "0", 1);
 	ecore_evas_init();
 	if (!makePhoto(gPhoto, 12345) || !tagPortrait(gPhoto)) {
 		fprintf(stderr, "cannot write the test photo\n");

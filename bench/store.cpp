@@ -7,6 +7,8 @@
 #include "List/MemoItemList.h"
 #include "MemoCvt.h"
 
+#include "BenchEnv.h"
+
 #include <Elementary.h>
 #include <app_common.h>
 #include <benchmark/benchmark.h>
@@ -263,17 +265,9 @@ BENCHMARK(BM_removeMemo)->Unit(benchmark::kMillisecond)->Iterations(50);
 int main(int argc, char **argv)
 {
 	// A private store: the user's memos are never touched.
-	char tmpl[] = "/tmp/memo-bench-XXXXXX";
-	if (!mkdtemp(tmpl))
+	gRoot = memo_bench::setUpPrivateRoot("store");
+	if (gRoot.empty())
 		return 1;
-	gRoot = tmpl;
-	setenv("TIZEN_APP_ROOT", (gRoot + "/app").c_str(), 1);
-	setenv("TIZEN_VCONF_DIR", (gRoot + "/vconf").c_str(), 1);
-	setenv("TIZEN_APP_ID", "com.veltron.memo", 1);
-	setenv("ELM_ENGINE", "buffer", 1);
-	setenv("ELM_DISPLAY", "buffer", 1);
-	setenv("ECORE_NO_SYSTEM_MODULES", "1", 1);
-	setenv("DLOG_LEVEL", "6", 1); // errors only
 	elm_init(argc, argv);
 
 	benchmark::Initialize(&argc, argv);
