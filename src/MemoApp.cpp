@@ -89,6 +89,8 @@ bool MemoApp::onCreate()
 	elm_app_base_scale_set(APP_BASE_SCALE);
 
 	WWindowController *windowController = new WWindowController(APP_WINDOW_NAME, ELM_WIN_DIALOG_BASIC);
+	// The window manager shows the app's name; the window's name and class stay the app id.
+	windowController->setTitle("IDS_MEMO_BODY_MEMO", "memo");
 	attachWindowController(windowController);
 	Evas_Object *win = windowController->getEvasObj();
 

@@ -38,12 +38,20 @@ public:
 	Evas_Object *getConformantEvasObj() const;
 	const char *getName() const;
 
+	// The title that the window manager shows; until it is set, the window's name. With a domain, text is a
+	// message id of that text domain, translated now and again on every language change.
+	void setTitle(const char *text, const char *domain = nullptr);
+
 private:
 	static void __deleteRequestCb(void *data, Evas_Object *obj, void *eventInfo);
 	static void __winDelCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo);
 	static void __baseViewDelCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo);
+	static void __languageChangedCb(void *data, Evas_Object *obj, void *eventInfo);
+	void __applyTitle();
 
 	std::string __name;
+	std::string __title;
+	std::string __titleDomain;
 	Evas_Object *__win;
 	Evas_Object *__conformant;
 	Evas_Object *__baseLayout;

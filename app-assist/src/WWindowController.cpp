@@ -3,6 +3,7 @@
 
 #include <cstdio>
 #include <cstdlib>
+#include <libintl.h>
 
 #include <app.h>
 
@@ -37,7 +38,8 @@ static void __initialSize(int *w, int *h)
 }
 
 WWindowController::WWindowController(const char *name, Elm_Win_Type winType)
-    : __name(name ? name : ""), __win(nullptr), __conformant(nullptr), __baseLayout(nullptr), __baseView(nullptr)
+    : __name(name ? name : ""), __title(__name), __win(nullptr), __conformant(nullptr), __baseLayout(nullptr),
+      __baseView(nullptr)
 {
 	__win = elm_win_add(nullptr, __name.c_str(), winType);
 	if (!__win) {
@@ -51,6 +53,7 @@ WWindowController::WWindowController(const char *name, Elm_Win_Type winType)
 		elm_win_wm_rotation_available_rotations_set(__win, rotations, 4);
 	}
 	evas_object_smart_callback_add(__win, "delete,request", __deleteRequestCb, this);
+	evas_object_smart_callback_add(__win, "language,changed", __languageChangedCb, this);
 	evas_object_event_callback_add(__win, EVAS_CALLBACK_DEL, __winDelCb, this);
 
 	__conformant = elm_conformant_add(__win);
@@ -79,6 +82,7 @@ WWindowController::~WWindowController()
 		return;
 	Evas_Object *win = __win;
 	evas_object_smart_callback_del_full(win, "delete,request", __deleteRequestCb, this);
+	evas_object_smart_callback_del_full(win, "language,changed", __languageChangedCb, this);
 	evas_object_event_callback_del_full(win, EVAS_CALLBACK_DEL, __winDelCb, this);
 	if (__baseView && __baseView->getEvasObj())
 		evas_object_event_callback_del_full(__baseView->getEvasObj(), EVAS_CALLBACK_DEL, __baseViewDelCb, this);
@@ -139,6 +143,28 @@ Evas_Object *WWindowController::getConformantEvasObj() const
 const char *WWindowController::getName() const
 {
 	return __name.c_str();
+}
+
+void WWindowController::setTitle(const char *text, const char *domain)
+{
+	__title = text ? text : "";
+	__titleDomain = domain ? domain : "";
+	__applyTitle();
+}
+
+void WWindowController::__applyTitle()
+{
+	if (!__win)
+		return;
+	const char *title = __title.c_str();
+	if (!__titleDomain.empty() && !__title.empty())
+		title = dgettext(__titleDomain.c_str(), title);
+	elm_win_title_set(__win, title);
+}
+
+void WWindowController::__languageChangedCb(void *data, Evas_Object *, void *)
+{
+	static_cast<WWindowController *>(data)->__applyTitle();
 }
 
 void WWindowController::__deleteRequestCb(void *, Evas_Object *, void *)
