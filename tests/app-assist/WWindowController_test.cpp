@@ -18,8 +18,9 @@ TEST_F(WindowTitleTest, TranslatedTitleFollowsTheLanguage)
 	EXPECT_STREQ("app-assist-test", elm_win_title_get(win));
 
 	std::string locale = memo_test::makeTempDir("locale");
-	ASSERT_EQ(0, memo_test::runCommand("mkdir -p " + locale + "/de/LC_MESSAGES && printf 'msgid \"IDS_T\"\\nmsgstr "
-	                                   "\"Notiz\"\\n' | msgfmt -o " + locale + "/de/LC_MESSAGES/wtitle.mo -"));
+	std::string de = locale + "/de/LC_MESSAGES";
+	const char *po = "printf 'msgid \"IDS_T\"\\nmsgstr \"Notiz\"\\n'";
+	ASSERT_EQ(0, memo_test::runCommand("mkdir -p " + de + " && " + po + " | msgfmt -o " + de + "/wtitle.mo -"));
 	bindtextdomain("wtitle", locale.c_str());
 	setlocale(LC_ALL, "C.UTF-8");
 	setenv("LANGUAGE", "en", 1);
