@@ -1,4 +1,4 @@
-/* Runs on the buffer engine (the in-process tests): save the first screen of the app as PNG (TIZEN_SCREENSHOT=<png>). */
+/* On the buffer engine (in-process tests): save the first screen of the app as PNG (TIZEN_SCREENSHOT=<png>). */
 #include <Ecore_Evas.h>
 #include <Elementary.h>
 #include <app.h>
