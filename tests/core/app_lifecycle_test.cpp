@@ -161,7 +161,9 @@ TEST_F(AppLifecycleTest, startRunsTheLifecycleInOrderAndBuildsAnEmptyWindow)
 	auto checkFirstScreen = [this] {
 		Evas_Object *win = window();
 		ASSERT_NE(win, nullptr);
-		EXPECT_STREQ(elm_win_title_get(win), "com.veltron.memo");
+		// The window manager shows the app's name; the window keeps the app id as its name.
+		EXPECT_STREQ(elm_win_title_get(win), "Memo");
+		EXPECT_STREQ(current->getWindowController()->getName(), "com.veltron.memo");
 		app_assist::WNaviframeController *naviframe = app_test::naviframeOf(current);
 		ASSERT_NE(naviframe, nullptr);
 		EXPECT_EQ(naviframe->getContentViewCount(), 0);
