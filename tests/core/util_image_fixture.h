@@ -11,7 +11,9 @@
 #include <gtest/gtest.h>
 #include <image_util.h>
 #include <libexif/exif-data.h>
+#include <png.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
@@ -73,6 +75,37 @@ inline void writeEvasImage(const std::string &path, int w, int h, const ColorFn 
 	evas_object_image_data_set(img, px);
 	EXPECT_TRUE(evas_object_image_save(img, path.c_str(), nullptr, "compress=1"));
 	ecore_evas_free(ee);
+}
+
+// Writes a PNG through libpng in one of its simple formats: PNG_FORMAT_RGBA, PNG_FORMAT_GRAY (the green
+// channel) or PNG_FORMAT_RGBA_COLORMAP (a palette of the colours used, at most 256).
+inline void writePng(const std::string &path, int w, int h, png_uint_32 format, const ColorFn &color)
+{
+	png_image image = {};
+	image.version = PNG_IMAGE_VERSION;
+	image.width = w;
+	image.height = h;
+	image.format = format;
+	std::vector<png_byte> px(PNG_IMAGE_SIZE(image)), map;
+	for (int i = 0; i < w * h; i++) {
+		const uint32_t c = color(i % w, i / w);
+		const png_byte rgba[4] = {png_byte(c >> 16), png_byte(c >> 8), png_byte(c), png_byte(c >> 24)};
+		if (format & PNG_FORMAT_FLAG_COLORMAP) {
+			size_t at = 0;
+			while (at < map.size() && !std::equal(rgba, rgba + 4, map.begin() + at))
+				at += 4;
+			if (at == map.size())
+				map.insert(map.end(), rgba, rgba + 4);
+			px[i] = static_cast<png_byte>(at / 4);
+		} else if (format == PNG_FORMAT_GRAY) {
+			px[i] = rgba[1];
+		} else {
+			std::copy(rgba, rgba + 4, &px[static_cast<size_t>(i) * 4]);
+		}
+	}
+	image.colormap_entries = static_cast<png_uint_32>(map.size() / 4);
+	ASSERT_TRUE(png_image_write_to_file(&image, path.c_str(), 0, px.data(), 0, map.empty() ? nullptr : map.data()))
+	    << image.message;
 }
 
 struct Picture {
