@@ -62,9 +62,9 @@ public:
 	static bool resizeImageJpg(const char *srcPath, const char *dstPath, int width, int height);
 	// Stretches the PNG srcPath to width x height into the PNG dstPath (may be the same path), as
 	// resizeImage's mode 2 does but without a canvas, so that a worker shrinks a picture wholly off the
-	// main loop; the pixels are the canvas's to within two levels. False when the source is missing or
-	// not a readable PNG, or a size is not positive; a failed save is logged ("Resizing failed."), leaves
-	// no target, and still gives true.
+	// main loop; the pixels are the canvas's to within two levels. False when the source is missing, not
+	// a readable PNG or of 9000000 pixels or more, or a size is not positive; a failed save is logged
+	// ("Resizing failed."), leaves no target, and still gives true.
 	static bool resizeImagePng(const char *srcPath, const char *dstPath, int width, int height);
 	// Renders srcPath into dstPath (the format follows dstPath's extension) through a buffer
 	// canvas of width x height. cropMode 0 fits the height and centres, 1 makes the canvas as wide

@@ -20,6 +20,9 @@ namespace
 {
 // The canvas's saver writes at the strongest compression.
 const int PNG_COMPRESSION = 9;
+// Pictures other than JPEG are admitted below this many pixels (getInsertImageSize); larger ones are not
+// decoded at all, whatever their header claims.
+const uint64_t PIXEL_LIMIT = 9000000;
 
 // Straight or premultiplied RGBA, 4 bytes a pixel, rows packed.
 struct Rgba {
@@ -75,6 +78,8 @@ bool decodePng(FILE *file, Rgba *out)
 	png_set_interlace_handling(png);
 	png_read_update_info(png, info);
 	const png_uint_32 width = png_get_image_width(png, info), height = png_get_image_height(png, info);
+	if (static_cast<uint64_t>(width) * height >= PIXEL_LIMIT)
+		png_error(png, "too many pixels");
 	bytes = allocRgba(width, height);
 	rows = static_cast<png_bytep *>(malloc(sizeof(png_bytep) * height));
 	if (!bytes || !rows || png_get_rowbytes(png, info) != static_cast<size_t>(width) * 4)
