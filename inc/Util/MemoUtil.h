@@ -49,9 +49,9 @@ public:
 	static bool isSalesCodeKTC();
 
 	// ---- Image processing (MemoUtilImage.cpp) ----
-	// resizeImageJpg, getOrient and rotateImage use no shared state and may run on any thread.
-	// getInsertImageSize and resizeImage use an Evas canvas; called off the main loop they run
-	// that part on the main loop and wait for it (the main loop must be running).
+	// resizeImageJpg, resizeImagePng, getOrient and rotateImage use no shared state and may run on
+	// any thread. getInsertImageSize and resizeImage use an Evas canvas; called off the main loop they
+	// run that part on the main loop and wait for it (the main loop must be running).
 
 	// Shrinks the JPEG srcPath into dstPath (may be the same path) to fit width x height: the
 	// larger value goes to the picture's longer side, both swapped for a square picture. The
@@ -60,11 +60,19 @@ public:
 	// failures are logged and still give true.
 	static bool resizeImageJpg(const char *srcPath, const char *dstPath, int width, int height, float scale);
 	static bool resizeImageJpg(const char *srcPath, const char *dstPath, int width, int height);
+	// Stretches the PNG srcPath to width x height into the PNG dstPath (may be the same path), as
+	// resizeImage's mode 2 does but without a canvas, so that a worker shrinks a picture wholly off the
+	// main loop; the pixels are the canvas's to within two levels. False when the source is missing, not
+	// a readable PNG or of 9000000 pixels or more, or a size is not positive; a failed save is logged
+	// ("Resizing failed."), leaves no target, and still gives true.
+	static bool resizeImagePng(const char *srcPath, const char *dstPath, int width, int height);
 	// Renders srcPath into dstPath (the format follows dstPath's extension) through a buffer
 	// canvas of width x height. cropMode 0 fits the height and centres, 1 makes the canvas as wide
 	// as the picture at that height, 2 stretches, 3 crops to the box's proportions (top rows of a
-	// tall picture, the middle of a wide one) and scales. True when a canvas was rendered, even
-	// if saving failed ("Resizing failed." is logged).
+	// tall picture, the middle of a wide one) and scales; other modes draw nothing. False only when
+	// no canvas or no rendered pixels could be had: a source that cannot be read renders an empty
+	// (transparent) canvas, sizes below 1 become 1, and a failed save is logged ("Resizing
+	// failed.") and still gives true.
 	static bool resizeImage(const char *srcPath, const char *dstPath, int width, int height, int cropMode);
 	// The EXIF orientation (1 to 8) of the file, or 0 without a readable tag.
 	static int getOrient(const char *path);

@@ -34,6 +34,11 @@ bool isJpeg(const std::string &path)
 	return eina_str_has_extension(path.c_str(), ".jpg") || eina_str_has_extension(path.c_str(), ".jpeg");
 }
 
+bool isPng(const std::string &path)
+{
+	return eina_str_has_extension(path.c_str(), ".png");
+}
+
 // Copies a file with the kernel doing the work: a camera picture is several megabytes, and a copy through
 // user space buffers would hold the main loop for a whole frame. False (and no target) on failure.
 bool copyFile(const std::string &from, const std::string &to)
@@ -299,8 +304,10 @@ void MemoBoxItem::__detachResizeJobs()
 	__threadHandle = nullptr;
 }
 
-// Worker: reads the source and replaces the job's file with the shrunk picture; touches nothing else.
-// When shrinking fails, a target that does not exist yet gets a plain copy of the source.
+// Worker: reads the source and replaces the job's file with the shrunk picture; touches nothing else. JPEG
+// and PNG pictures are decoded, scaled and encoded on this thread; other formats, and a PNG name over other
+// content, are drawn by the canvas on the main loop while the worker waits. When shrinking fails, a target
+// that does not exist yet gets a plain copy of the source.
 void MemoBoxItem::__resizeWorkerCb(void *data, Ecore_Thread *thread)
 {
 	(void)thread;
@@ -308,7 +315,7 @@ void MemoBoxItem::__resizeWorkerCb(void *data, Ecore_Thread *thread)
 	const std::string work = workFileFor(job->path);
 	if (isJpeg(job->path))
 		MemoUtil::resizeImageJpg(job->source.c_str(), work.c_str(), job->width, job->height, job->ratio);
-	else
+	else if (!isPng(job->path) || !MemoUtil::resizeImagePng(job->source.c_str(), work.c_str(), job->width, job->height))
 		MemoUtil::resizeImage(job->source.c_str(), work.c_str(), job->width, job->height, 2);
 	if (ecore_file_exists(work.c_str())) {
 		if (rename(work.c_str(), job->path.c_str()) != 0) {

@@ -143,30 +143,28 @@ Evas_Object *cropToBox(Evas *evas, Evas_Object *src, int width, int height)
 	return crop;
 }
 
-// Loads the source onto the canvas and places it for the crop mode; may widen *width (mode 1).
+// Loads the source onto the canvas and places it for the crop mode; may widen *width (mode 1). Null when
+// there is nothing to draw: a source that cannot be read still gets its (empty) canvas rendered.
 Evas_Object *placeImage(Evas *evas, RenderJob *job, int *width, int *x, int *drawnWidth)
 {
 	Evas_Object *img = evas_object_image_filled_add(evas);
 	evas_object_image_file_set(img, job->srcPath, nullptr);
 	int iw = 0, ih = 0;
 	evas_object_image_size_get(img, &iw, &ih);
-	int err = evas_object_image_load_error_get(img);
-	if (err != EVAS_LOAD_ERROR_NONE || iw <= 0 || ih <= 0) {
-		MEMO_LOGE("cannot load %s: %d", job->srcPath, err);
-		evas_object_del(img);
-		return nullptr;
-	}
+	const int err = evas_object_image_load_error_get(img);
+	if (err != EVAS_LOAD_ERROR_NONE)
+		MEMO_LOGE("cannot load %s: %d", job->srcPath ? job->srcPath : "(null)", err);
 	const int height = job->height;
 	*x = 0;
 	*drawnWidth = 0;
 	if (job->cropMode == CROP_TO_BOX) {
 		evas_object_image_alpha_set(img, 1);
-		Evas_Object *crop = cropToBox(evas, img, *width, height);
+		Evas_Object *crop = iw > 0 && ih > 0 ? cropToBox(evas, img, *width, height) : nullptr;
 		evas_object_del(img);
 		*drawnWidth = *width;
 		return crop;
 	}
-	const float ratio = static_cast<float>(iw) / ih;
+	const float ratio = ih > 0 ? static_cast<float>(iw) / ih : 0.0f;
 	switch (job->cropMode) {
 	case CROP_FIT_HEIGHT:
 		*drawnWidth = static_cast<int>(ratio * height);
@@ -185,18 +183,18 @@ Evas_Object *placeImage(Evas *evas, RenderJob *job, int *width, int *x, int *dra
 	return img;
 }
 
+// False only without a canvas or its pixels; the canvas takes sizes below 1 as 1.
 bool renderImage(RenderJob *job)
 {
-	if (job->width <= 0 || job->height <= 0) {
-		MEMO_LOGE("invalid size %d x %d", job->width, job->height);
-		return false;
-	}
 	Ecore_Evas *ee = ecore_evas_buffer_new(job->width, job->height);
 	if (!ee) {
 		MEMO_LOGE("ecore_evas_buffer_new failed");
 		return false;
 	}
 	ecore_evas_manual_render_set(ee, 1);
+	// A canvas with alpha is cleared before it is drawn: without it, what the picture leaves uncovered or
+	// shows through its own transparency would be whatever the buffer's memory held.
+	ecore_evas_alpha_set(ee, EINA_TRUE);
 	Evas *evas = ecore_evas_get(ee);
 	if (!evas) {
 		MEMO_LOGE("ecore_evas_get failed");
@@ -205,14 +203,14 @@ bool renderImage(RenderJob *job)
 	}
 	int width = job->width, x = 0, drawnWidth = 0;
 	Evas_Object *img = placeImage(evas, job, &width, &x, &drawnWidth);
-	if (!img || width <= 0) {
-		ecore_evas_free(ee);
-		return false;
-	}
 	ecore_evas_resize(ee, width, job->height);
-	evas_object_move(img, x, 0);
-	evas_object_resize(img, drawnWidth, job->height);
-	evas_object_show(img);
+	if (img) {
+		evas_object_move(img, x, 0);
+		evas_object_resize(img, drawnWidth, job->height);
+		evas_object_show(img);
+	}
+	int canvasWidth = 0, canvasHeight = 0;
+	ecore_evas_geometry_get(ee, nullptr, nullptr, &canvasWidth, &canvasHeight);
 
 	const void *pixels = ecore_evas_buffer_pixels_get(ee);
 	if (!pixels) {
@@ -221,7 +219,7 @@ bool renderImage(RenderJob *job)
 		return false;
 	}
 	Evas_Object *out = evas_object_image_add(evas);
-	evas_object_image_size_set(out, width, job->height);
+	evas_object_image_size_set(out, canvasWidth, canvasHeight);
 	evas_object_image_data_set(out, const_cast<void *>(pixels));
 	evas_object_image_alpha_set(out, 1);
 	evas_object_image_colorspace_set(out, EVAS_COLORSPACE_ARGB8888);

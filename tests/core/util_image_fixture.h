@@ -11,7 +11,9 @@
 #include <gtest/gtest.h>
 #include <image_util.h>
 #include <libexif/exif-data.h>
+#include <png.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
@@ -57,22 +59,34 @@ inline void writeJpeg(const std::string &path, int w, int h, const ColorFn &colo
 	          image_util_encode_jpeg(rgb.data(), w, h, IMAGE_UTIL_COLORSPACE_RGB888, 95, path.c_str()));
 }
 
-// Writes any format Evas can save (by extension), through a throw-away buffer canvas.
-inline void writeEvasImage(const std::string &path, int w, int h, const ColorFn &color)
+// Writes a PNG in one of libpng's simple formats: PNG_FORMAT_RGBA, PNG_FORMAT_GRAY (the green channel)
+// or PNG_FORMAT_RGBA_COLORMAP (a palette of the colours used, at most 256).
+inline void writePng(const std::string &path, int w, int h, const ColorFn &color, png_uint_32 format = PNG_FORMAT_RGBA)
 {
-	Ecore_Evas *ee = ecore_evas_buffer_new(1, 1);
-	ASSERT_NE(nullptr, ee);
-	Evas_Object *img = evas_object_image_add(ecore_evas_get(ee));
-	evas_object_image_size_set(img, w, h);
-	uint32_t *px = static_cast<uint32_t *>(evas_object_image_data_get(img, EINA_TRUE));
-	ASSERT_NE(nullptr, px);
-	int stride = evas_object_image_stride_get(img) / 4;
-	for (int y = 0; y < h; y++)
-		for (int x = 0; x < w; x++)
-			px[y * stride + x] = color(x, y);
-	evas_object_image_data_set(img, px);
-	EXPECT_TRUE(evas_object_image_save(img, path.c_str(), nullptr, "compress=1"));
-	ecore_evas_free(ee);
+	png_image image = {};
+	image.version = PNG_IMAGE_VERSION;
+	image.width = w;
+	image.height = h;
+	image.format = format;
+	std::vector<png_byte> px(PNG_IMAGE_SIZE(image)), map;
+	for (int i = 0; i < w * h; i++) {
+		const uint32_t c = color(i % w, i / w);
+		const png_byte rgba[4] = {png_byte(c >> 16), png_byte(c >> 8), png_byte(c), png_byte(c >> 24)};
+		if (format & PNG_FORMAT_FLAG_COLORMAP) {
+			size_t at = 0;
+			while (at < map.size() && !std::equal(rgba, rgba + 4, &map[at]))
+				at += 4;
+			if (at == map.size())
+				map.insert(map.end(), rgba, rgba + 4);
+			px[i] = static_cast<png_byte>(at / 4);
+		} else if (format == PNG_FORMAT_GRAY)
+			px[i] = rgba[1];
+		else
+			std::copy(rgba, rgba + 4, &px[static_cast<size_t>(i) * 4]);
+	}
+	image.colormap_entries = static_cast<png_uint_32>(map.size() / 4);
+	ASSERT_TRUE(png_image_write_to_file(&image, path.c_str(), 0, px.data(), 0, map.empty() ? nullptr : map.data()))
+	    << image.message;
 }
 
 struct Picture {
