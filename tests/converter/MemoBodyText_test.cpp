@@ -2,6 +2,7 @@
 #include "Box/MemoContentMarkup.h"
 #include "Box/MemoShareText.h"
 #include "Box/MemoTodoListDocument.h"
+#include "Util/MemoUtil.h"
 
 #include <Elementary.h>
 #include <gtest/gtest.h>
@@ -96,4 +97,14 @@ TEST(PickText, TitleAndDisplayOnlyWithDocument)
 	EXPECT_EQ("T\n", memoComposePickText("T", "", "stale"));
 	EXPECT_EQ("body", memoComposePickText("", "<todolist>", "body"));
 	EXPECT_EQ("", memoComposePickText(nullptr, nullptr, nullptr));
+}
+
+TEST(StorableText, ControlCharactersGoAndLineEndsStay)
+{
+	// What a share or another application hands in: the text must fit a stored document.
+	char *text = MemoUtil::stripControlCharsN("a\x01"
+	                                          "b\tc\r\nd\re\x7f\xEF\xBF\xBF\xC3\xA9\xFF\x1b");
+	EXPECT_STREQ("ab\tc\nd\ne\x7f\xC3\xA9", text);
+	free(text);
+	EXPECT_EQ(nullptr, MemoUtil::stripControlCharsN(nullptr));
 }

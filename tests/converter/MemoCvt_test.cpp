@@ -1,5 +1,6 @@
 // The converter's stored forms, the quick memo append, and its behaviour on bad input.
 #include "MemoCvt.h"
+#include "TestEnv.h"
 #include "todolist_fixture.h"
 
 #include <gtest/gtest.h>
@@ -13,14 +14,6 @@ using namespace todolist_test;
 
 namespace
 {
-size_t countOf(const std::string &text, const std::string &what)
-{
-	size_t n = 0;
-	for (size_t pos = text.find(what); pos != std::string::npos; pos = text.find(what, pos + 1))
-		++n;
-	return n;
-}
-
 // True when the document is well-formed XML.
 bool wellFormed(const std::string &xml)
 {
@@ -113,8 +106,8 @@ TEST(MemoCvtQuickMemo, AppendWithQuoteAngleBracketsAndBreak)
 	ASSERT_EQ(2u, items.size());
 	EXPECT_EQ("two &amp; \"more\"", items[1].content);
 	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, second);
-	EXPECT_EQ(1u, countOf(cvt.getStrippedContent(), "say \"hi\""));
-	EXPECT_EQ(1u, countOf(cvt.getStrippedContent(), "two & \"more\""));
+	EXPECT_EQ(1u, memo_test::countOf(cvt.getStrippedContent(), "say \"hi\""));
+	EXPECT_EQ(1u, memo_test::countOf(cvt.getStrippedContent(), "two & \"more\""));
 }
 
 TEST(MemoCvtQuickMemo, StoredDocumentEdgeCases)
@@ -131,6 +124,11 @@ TEST(MemoCvtQuickMemo, StoredDocumentEdgeCases)
 	items = parse(quickAppend(stored, ""));
 	ASSERT_EQ(3u, items.size());
 	EXPECT_EQ("", items[2].content);
+
+	// Content behind the first root: the append takes that root's place, and the text is there once.
+	items = parse(quickAppend(stored + "<todolist>\n</todolist>\n", "c"));
+	ASSERT_EQ(3u, items.size());
+	EXPECT_EQ("c", items[2].content);
 
 	// A source that does not end with the appended item still gets the text once, at the end.
 	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, stored);

@@ -1,4 +1,5 @@
 // The todolist document as the editor writes and reads it.
+#include "XmlWriteFailure.h"
 #include "todolist_fixture.h"
 
 #include <gtest/gtest.h>
@@ -18,6 +19,16 @@ TEST(TodoListWriter, LayoutAndEscaping)
 	          "</todolist>\n",
 	          xml);
 	EXPECT_EQ("", compose({}));
+	// XML cannot carry most control characters: they are left out, so the document stays readable.
+	EXPECT_EQ("a b", parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false,
+	                                     "a\x01 \x1f"
+	                                     "b")}))[0]
+	                     .content);
+	// A failed write gives no document at all rather than an empty one.
+	{
+		memo_test::XmlWriteFailure failure;
+		EXPECT_EQ(nullptr, memoComposeTodoListXmlN({item(MEMO_BOX_ITEM_TEXT, false, "x")}));
+	}
 	// Empty items are skipped, a ticked one included: its tick is lost.
 	EXPECT_EQ("", compose({item(MEMO_BOX_ITEM_FIRST_CHECK, true, ""), item(MEMO_BOX_ITEM_TEXT, false, "")}));
 }

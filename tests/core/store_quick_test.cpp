@@ -1,4 +1,6 @@
 // The quick memo row and the PIN row.
+#include "Box/MemoTodoListDocument.h"
+#include "XmlWriteFailure.h"
 #include "store_test_fixture.h"
 
 using namespace store_test;
@@ -35,6 +37,25 @@ TEST_F(StoreQuick, AppendedTextsKeepTheirOrder)
 	document = quickColumn("tizenXmlContent");
 	EXPECT_EQ(std::string::npos, document.find("old loose text"));
 	EXPECT_NE(std::string::npos, document.find("fresh"));
+}
+
+TEST_F(StoreQuick, TextFromOutsideNeverBreaksTheMemo)
+{
+	ASSERT_NE(nullptr, db());
+	// A control character is left out: the document still reads back, with the text.
+	ASSERT_TRUE(db()->addQuickMemo("one\x01two"));
+	std::vector<MemoTodoListItem> items;
+	ASSERT_TRUE(memoParseTodoListXml(quickColumn("tizenXmlContent").c_str(), items));
+	ASSERT_EQ(1u, items.size());
+	EXPECT_EQ("onetwo", items[0].content);
+
+	// A failed write stores nothing: the memo stays as it was.
+	const std::string before = quickColumn("tizenXmlContent") + quickColumn("strippedContent");
+	{
+		memo_test::XmlWriteFailure failure;
+		EXPECT_FALSE(db()->addQuickMemo("lost"));
+	}
+	EXPECT_EQ(before, quickColumn("tizenXmlContent") + quickColumn("strippedContent"));
 }
 
 TEST_F(StoreQuick, NoQuickMemoRowDropsTheText)

@@ -1,6 +1,8 @@
 // The box control built from a record and read back as a todolist document.
 #include <gtest/gtest.h>
 
+#include "Box/MemoTodoListDocument.h"
+#include "XmlWriteFailure.h"
 #include "box_control_fixture.h"
 
 using namespace memo_ui_test;
@@ -10,12 +12,6 @@ namespace
 class BoxControlDocumentTest : public BoxControlFixture
 {
 };
-
-std::string escapedTag(int w, int h, const std::string &path)
-{
-	return "&lt;item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path +
-		   "&gt;&lt;/item&gt;&lt;br/&gt;";
-}
 } // namespace
 
 TEST_F(BoxControlDocumentTest, NewMemoIsATitleAndOneFirstTextItem)
@@ -41,9 +37,9 @@ TEST_F(BoxControlDocumentTest, StoredDocumentComesBackByteForByte)
 	const std::string picture = dir + "stored.png";
 	ASSERT_TRUE(writePicture(picture, 1000, 500));
 	// At scale 1.0 a text item shows pictures 628 wide: 500 * 628 / 1000 + 40 = 354.
-	const std::string xml = todoList(todoItem(0, false, "Shopping &amp;amp; more&lt;br/&gt;second line") +
-									 todoItem(1, true, "milk") + todoItem(1, false, "bread") +
-									 todoItem(0, false, "see " + escapedTag(628, 354, picture) + "end"));
+	const std::string xml =
+	    todoList(todoItem(0, false, "Shopping &amp;amp; more&lt;br/&gt;second line") + todoItem(1, true, "milk") +
+	             todoItem(1, false, "bread") + todoItem(0, false, "see " + escapedTag(628, 354, picture) + "end"));
 	MemoDocInfo doc;
 	doc.setMemoUUID("box-test-memo");
 	doc.setTitle("Weekend");
@@ -72,7 +68,7 @@ TEST_F(BoxControlDocumentTest, FirstCheckAndUnknownTypes)
 {
 	MemoDocInfo doc;
 	doc.setTizenXmlContent(
-		todoList(todoItem(2, false, "dropped") + todoItem(1, false, "a") + todoItem(0, false, "b")).c_str());
+	    todoList(todoItem(2, false, "dropped") + todoItem(1, false, "a") + todoItem(0, false, "b")).c_str());
 	makeControl(&doc, MODE_UPDATE);
 	ASSERT_EQ(2u, items().size());
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, items()[0]->getType());
@@ -89,15 +85,43 @@ TEST_F(BoxControlDocumentTest, UnreadableDocumentGivesOneEmptyItem)
 	EXPECT_EQ("", document(control));
 }
 
-TEST_F(BoxControlDocumentTest, EmptyAndTickedEmptyItemsAreNotWritten)
+TEST_F(BoxControlDocumentTest, OnlyTextThatShowsIsWrittenAndAlwaysReadable)
 {
 	MemoDocInfo doc;
 	doc.setTizenXmlContent(todoList(todoItem(0, false, "keep") + todoItem(1, true, "x")).c_str());
 	makeControl(&doc, MODE_UPDATE);
 	ASSERT_EQ(2u, items().size());
-	elm_entry_entry_set(items()[1]->getEntry(), "");
-	EXPECT_EQ(todoList(todoItem(0, false, "keep")), document(control));
-	elm_entry_entry_set(items()[0]->getEntry(), "");
+	Evas_Object *first = items()[0]->getEntry();
+	Evas_Object *second = items()[1]->getEntry();
+	// Format tags left behind by deleted text show nothing, for the entry as for the document; a
+	// ticked empty line loses its tick.
+	for (const char *markup : {"", "<color=#ff0000ff></color>", "<underline=on></underline>"}) {
+		elm_entry_entry_set(second, markup);
+		EXPECT_TRUE(elm_entry_is_empty(second)) << markup;
+		EXPECT_EQ(todoList(todoItem(0, false, "keep")), document(control)) << markup;
+	}
+	elm_entry_entry_set(second, "<br/>");
+	EXPECT_EQ(todoList(todoItem(0, false, "keep") + todoItem(1, true, "&lt;br/&gt;")), document(control));
+
+	// Control characters, pasted or set, never reach the document: it reads back with the text.
+	elm_entry_entry_set(first, "");
+	items()[0]->insertText("a\x01"
+	                       "b");
+	elm_entry_entry_set(second, "c\x02"
+	                            "d");
+	std::vector<MemoTodoListItem> back;
+	ASSERT_TRUE(memoParseTodoListXml(document(control).c_str(), back));
+	ASSERT_EQ(2u, back.size());
+	EXPECT_EQ("ab", back[0].content);
+	EXPECT_EQ("cd", back[1].content);
+
+	// A failed write gives no document, so that no save stores an empty body.
+	{
+		memo_test::XmlWriteFailure failure;
+		EXPECT_EQ("<null>", document(control));
+	}
+	elm_entry_entry_set(first, "");
+	elm_entry_entry_set(second, "");
 	EXPECT_EQ("", document(control));
 }
 

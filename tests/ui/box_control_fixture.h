@@ -45,7 +45,7 @@ protected:
 		control->getSignal().addListener([this](const char *key, void *payload) {
 			keys.push_back(key);
 			payloads.push_back(payload && strcmp(key, "action,image,selected") == 0 ? static_cast<char *>(payload)
-																					  : "");
+			                                                                        : "");
 		});
 		render();
 		runFor(0.05);
@@ -114,12 +114,19 @@ protected:
 inline std::string todoItem(int type, bool state, const std::string &escapedContent)
 {
 	return std::string("<todolist_item todo_item_type=\"") + std::to_string(type) + "\" todo_item_state=\"" +
-		   (state ? "true" : "false") + "\" todo_item_content=\"" + escapedContent + "\"/>\n";
+	       (state ? "true" : "false") + "\" todo_item_content=\"" + escapedContent + "\"/>\n";
 }
 
 inline std::string todoList(const std::string &lines)
 {
 	return "<todolist>\n" + lines + "</todolist>\n";
+}
+
+// A picture tag with its break, escaped as todolist content.
+inline std::string escapedTag(int w, int h, const std::string &path)
+{
+	return "&lt;item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path +
+	       "&gt;&lt;/item&gt;&lt;br/&gt;";
 }
 
 } // namespace memo_ui_test

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "DataBase/MemoDbMgr.h"
+#include "TestEnv.h"
 #include "box_control_fixture.h"
 
 using namespace memo_ui_test;
@@ -74,6 +75,33 @@ TEST_F(BoxControlItemsTest, RemovingALaterItemMergesIntoTheOneBefore)
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, first->getType());
 }
 
+TEST_F(BoxControlItemsTest, MergingKeepsEveryCharacterAndCountsPicturesOnce)
+{
+	// 2,500 and 1,500 characters fit the shared 4,096 together: the merge keeps them all.
+	withBody(todoItem(0, false, std::string(2500, 'a')) + todoItem(0, false, std::string(1500, 'b')));
+	focusAt(items()[1], 0);
+	pressKey("BackSpace", "\b");
+	pressKey("BackSpace", "\b");
+	ASSERT_EQ(1u, items().size());
+	EXPECT_EQ(4000u, text(items()[0]).size());
+
+	// Pictures of the removed item count once: merging 2 into 2, then 6 into those 4, keeps all 10.
+	std::string tags[3];
+	for (int i = 0; i < 10; i++)
+		tags[i < 2 ? 0 : i < 4 ? 1 : 2] += escapedTag(628, 354, mediaDir() + std::to_string(i) + ".png");
+	evas_object_del(win);
+	UiFixture::SetUp();
+	withBody(todoItem(0, false, tags[0]) + todoItem(0, false, tags[1]) + todoItem(0, false, tags[2]));
+	for (int merge = 0; merge < 2; merge++) {
+		focusAt(items()[1], 0);
+		pressKey("BackSpace", "\b");
+		pressKey("BackSpace", "\b");
+		EXPECT_EQ(10, control->onEntryCheckImageCount()) << merge;
+	}
+	ASSERT_EQ(1u, items().size());
+	EXPECT_EQ(10u, memo_test::countOf(text(items()[0]), "<item"));
+}
+
 TEST_F(BoxControlItemsTest, TheOnlyItemIsNeverRemoved)
 {
 	withBody(todoItem(0, false, "alone"));
@@ -116,7 +144,7 @@ TEST_F(BoxControlItemsTest, ReturnOnACheckLineAddsTheNewLineRightBehindIt)
 
 	typeText("milk");
 	EXPECT_EQ(todoList(todoItem(1, false, "eggs") + todoItem(1, false, "milk") + todoItem(1, false, "flour")),
-			  document(control));
+	          document(control));
 }
 
 TEST_F(BoxControlItemsTest, NextAtTheTitleMovesToTheBody)

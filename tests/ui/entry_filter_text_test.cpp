@@ -87,10 +87,27 @@ TEST_F(EntryFilterTextTest, PastedLinesBecomeBreaksAndFormatGoes)
 	EXPECT_EQ("x<tab/>y", insert("x<tab/>y"));
 }
 
-TEST_F(EntryFilterTextTest, NoBreakSpacesAreDropped)
+TEST_F(EntryFilterTextTest, NoBreakSpacesAndControlCharactersAreDropped)
 {
-	EXPECT_EQ("ab", insert("a\xC2\xA0"
-	                       "b"));
+	EXPECT_EQ("abcde", insert("a\xC2\xA0"
+	                          "b&nbsp;c&#160;d&#xa0;e"));
+	EXPECT_EQ("ab<br/>c", insert("a\x01"
+	                             "b\r\nc\x1b"));
+}
+
+TEST_F(EntryFilterTextTest, ReturnAfterAPictureKeepsItInPlace)
+{
+	// The split of a line puts pictures back where no-break spaces stand; a pasted one must not be there.
+	MemoBoxItem *check = owner->addItem(MEMO_BOX_ITEM_CHECK);
+	check->insertText(("a&nbsp;b" + ghostTag(1)).c_str());
+	const std::string line = elm_entry_entry_get(check->getEntry());
+	focus(check->getEntry());
+	elm_entry_cursor_end_set(check->getEntry());
+	pressKey("Return", "\r");
+	runFor(0.05);
+	EXPECT_EQ(line, elm_entry_entry_get(check->getEntry()));
+	EXPECT_EQ(0u, line.find("ab<item size="));
+	EXPECT_EQ(1, owner->count("add:1:"));
 }
 
 TEST_F(EntryFilterTextTest, NoBudgetNothingEntersAndAToastSaysSo)
