@@ -3,6 +3,7 @@
 #include "Box/MemoShareText.h"
 #include "Box/MemoTodoListDocument.h"
 #include "Util/MemoUtil.h"
+#include "todolist_fixture.h"
 
 #include <Elementary.h>
 #include <gtest/gtest.h>
@@ -54,27 +55,20 @@ TEST(SavedMarkup, RemovesFormatTagsOnly)
 		EXPECT_EQ(c[1], saved(c[0])) << (c[0] ? c[0] : "(null)");
 }
 
-TEST(ShareMarkers, TwoTables)
+TEST_F(ShareText, EditShareListShareAndPickText)
 {
+	// Each view keeps its own table of markers.
 	const std::string display = "top\n<CHECK state=false>a</CHECK><CHECK state=true>b</CHECK>end";
 	EXPECT_EQ("top\n[  ]a\n[v]b\nend", memoApplyEditShareMarkers(display));
 	EXPECT_EQ("top\n[ ]a\n[V]b\nend", memoApplyListShareMarkers(display));
 	EXPECT_EQ("<CHECK state=maybe>", memoApplyListShareMarkers("<CHECK state=maybe>"));
-}
 
-TEST_F(ShareText, EditShareFromDocumentOrDisplayContent)
-{
-	std::vector<MemoTodoListItem> items(3);
-	items[0].type = MEMO_BOX_ITEM_FIRST_TEXT;
-	items[0].content = "Fish &amp; chips&lt;3<br/><item size=240x180 vsize=full href=file:///m/a.jpg></item><br/>x";
-	items[1].type = MEMO_BOX_ITEM_CHECK;
-	items[1].checked = true;
-	items[1].content = "milk";
-	items[2].type = MEMO_BOX_ITEM_CHECK;
-	items[2].content = "eggs";
-	char *doc = memoComposeTodoListXmlN(items);
-	const std::string text = memoComposeEditShareText("Title", doc, "ignored");
-	free(doc);
+	using todolist_test::item;
+	const std::string doc = todolist_test::compose(
+	    {item(MEMO_BOX_ITEM_FIRST_TEXT, false,
+	          "Fish &amp; chips&lt;3<br/><item size=240x180 vsize=full href=file:///m/a.jpg></item><br/>x"),
+	     item(MEMO_BOX_ITEM_CHECK, true, "milk"), item(MEMO_BOX_ITEM_CHECK, false, "eggs")});
+	const std::string text = memoComposeEditShareText("Title", doc.c_str(), "ignored");
 	EXPECT_EQ("Title\nFish & chips\xEF\xBC\x9C"
 	          "3\n\nx\n[v]milk\n[  ]eggs\n",
 	          text);
@@ -87,10 +81,8 @@ TEST_F(ShareText, EditShareFromDocumentOrDisplayContent)
 	EXPECT_EQ("", memoComposeEditShareText(nullptr, nullptr, nullptr));
 	const std::string longText(50000, 'a');
 	EXPECT_EQ(40959u, memoComposeEditShareText(nullptr, nullptr, longText.c_str()).size());
-}
 
-TEST(PickText, TitleAndDisplayOnlyWithDocument)
-{
+	// A pick gives the title, and the display text only with a document.
 	EXPECT_EQ("T\n[V]a\n[ ]b\n",
 	          memoComposePickText("T", "<todolist>...", "<CHECK state=true>a</CHECK><CHECK state=false>b</CHECK>"));
 	// A memo without a document contributes only its title.

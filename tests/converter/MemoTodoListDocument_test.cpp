@@ -20,10 +20,10 @@ TEST(TodoListWriter, LayoutAndEscaping)
 	          xml);
 	EXPECT_EQ("", compose({}));
 	// XML cannot carry most control characters: they are left out, so the document stays readable.
-	EXPECT_EQ("a b", parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false,
-	                                     "a\x01 \x1f"
-	                                     "b")}))[0]
-	                     .content);
+	const std::string control = compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false,
+	                                          "a\x01 \x1f"
+	                                          "b")});
+	EXPECT_EQ("a b", parse(control)[0].content);
 	// A failed write gives no document at all rather than an empty one.
 	{
 		memo_test::XmlWriteFailure failure;
@@ -53,7 +53,7 @@ TEST(TodoListWriter, LongDocumentIsCutAndReaderKeepsItemsBeforeTheCut)
 		EXPECT_EQ(items[i].content, back[i].content) << i;
 }
 
-TEST(TodoListRoundTrip, ContentTypesAndStates)
+TEST(TodoListRoundTrip, ContentTypesStatesAndTheFirstItem)
 {
 	const std::vector<MemoTodoListItem> items = {
 	    item(MEMO_BOX_ITEM_FIRST_TEXT, false,
@@ -64,7 +64,7 @@ TEST(TodoListRoundTrip, ContentTypesAndStates)
 	    item(MEMO_BOX_ITEM_TEXT, false, "\xE2\x9C\x93 \"quoted\" 'single'"),
 	};
 	bool ok = false;
-	const std::vector<MemoTodoListItem> back = parse(compose(items), &ok);
+	std::vector<MemoTodoListItem> back = parse(compose(items), &ok);
 	EXPECT_TRUE(ok);
 	ASSERT_EQ(items.size(), back.size());
 	for (size_t i = 0; i < items.size(); ++i) {
@@ -72,26 +72,21 @@ TEST(TodoListRoundTrip, ContentTypesAndStates)
 		EXPECT_EQ(items[i].checked, back[i].checked) << i;
 		EXPECT_EQ(items[i].content, back[i].content) << i;
 	}
-}
 
-TEST(TodoListRoundTrip, FirstSurvivingItemBecomesFirst)
-{
 	// The empty head is dropped at save, so the check item behind it comes back first.
-	const std::vector<MemoTodoListItem> back =
-	    parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, ""), item(MEMO_BOX_ITEM_CHECK, true, "a"),
-	                   item(MEMO_BOX_ITEM_TEXT, false, "b")}));
+	back = parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, ""), item(MEMO_BOX_ITEM_CHECK, true, "a"),
+	                      item(MEMO_BOX_ITEM_TEXT, false, "b")}));
 	ASSERT_EQ(2u, back.size());
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, back[0].type);
 	EXPECT_TRUE(back[0].checked);
 	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, back[1].type);
 	// Items read behind existing body items are never first.
-	const std::vector<MemoTodoListItem> behind =
-	    parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, "x")}), nullptr, 1);
-	ASSERT_EQ(1u, behind.size());
-	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, behind[0].type);
+	back = parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, "x")}), nullptr, 1);
+	ASSERT_EQ(1u, back.size());
+	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, back[0].type);
 }
 
-TEST(TodoListReader, StatedSlips)
+TEST(TodoListReader, StatedSlipsAndDocumentsWithoutItems)
 {
 	const std::string xml =
 	    "<todolist>\n"
@@ -112,10 +107,8 @@ TEST(TodoListReader, StatedSlips)
 	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, back[3].type);
 	EXPECT_FALSE(back[3].checked);
 	EXPECT_EQ("", back[3].content);
-}
 
-TEST(TodoListReader, RootWithoutItemsAndUnreadableDocuments)
-{
+	// A root without items gives none; an unreadable document gives one empty first item.
 	bool ok = false;
 	EXPECT_TRUE(parse("<todolist></todolist>", &ok).empty());
 	EXPECT_TRUE(ok);
@@ -127,11 +120,11 @@ TEST(TodoListReader, RootWithoutItemsAndUnreadableDocuments)
 	                  .size());
 
 	for (const char *bad : {"", "not xml", "<"}) {
-		const std::vector<MemoTodoListItem> back = parse(bad, &ok);
+		const std::vector<MemoTodoListItem> empty = parse(bad, &ok);
 		EXPECT_FALSE(ok) << bad;
-		ASSERT_EQ(1u, back.size()) << bad;
-		EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, back[0].type);
-		EXPECT_EQ("", back[0].content);
+		ASSERT_EQ(1u, empty.size()) << bad;
+		EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, empty[0].type);
+		EXPECT_EQ("", empty[0].content);
 	}
 	std::vector<MemoTodoListItem> items;
 	EXPECT_FALSE(memoParseTodoListXml(nullptr, items));

@@ -7,47 +7,28 @@ using namespace store_test;
 
 using StoreQuick = StoreTest;
 
-TEST_F(StoreQuick, AppendedTextsKeepTheirOrder)
+TEST_F(StoreQuick, AppendedTextsKeepTheirOrderAndNothingBreaksTheMemo)
 {
 	ASSERT_NE(nullptr, db());
 	db()->excuteSql("UPDATE memo SET lastModifiedAt = 1000 WHERE isQuick = 1");
 	vconf_set_int("db/memo/data-change", 0);
 
 	ASSERT_TRUE(db()->addQuickMemo("first text"));
-	ASSERT_TRUE(db()->addQuickMemo("say \"hi\" & <bye>"));
+	ASSERT_TRUE(db()->addQuickMemo("say \"hi\" & <bye>\x01"));
 	EXPECT_TRUE(db()->addQuickMemo(""));
-
-	std::string document = quickColumn("tizenXmlContent");
-	size_t first = document.find("first text");
-	size_t second = document.find("say");
-	ASSERT_NE(std::string::npos, first);
-	ASSERT_NE(std::string::npos, second);
-	EXPECT_LT(first, second);
-	EXPECT_EQ(std::string::npos, document.find("first text", first + 1)); // each once
+	// Each text once, in order; the control character is left out, so the memo reads back.
+	std::vector<MemoTodoListItem> items;
+	ASSERT_TRUE(memoParseTodoListXml(quickColumn("tizenXmlContent").c_str(), items));
+	ASSERT_EQ(3u, items.size());
+	EXPECT_EQ("first text", items[0].content);
+	EXPECT_EQ("say \"hi\" &amp; &lt;bye&gt;", items[1].content);
+	EXPECT_EQ("", items[2].content);
 	EXPECT_NE(std::string::npos, quickColumn("strippedContent").find("\"hi\""));
 	EXPECT_NE(std::string::npos, quickColumn("content").find("first text"));
 	EXPECT_NE("", quickColumn("xmlContent"));
 	EXPECT_EQ("1", quickColumn("isDirty"));
 	EXPECT_GT(atoll(quickColumn("lastModifiedAt").c_str()), 1000);
 	EXPECT_EQ(0, changeNotice()); // no change notice for quick memo text
-
-	// A body without the closing root tag is replaced.
-	db()->excuteSql("UPDATE memo SET tizenXmlContent = 'old loose text' WHERE isQuick = 1");
-	ASSERT_TRUE(db()->addQuickMemo("fresh"));
-	document = quickColumn("tizenXmlContent");
-	EXPECT_EQ(std::string::npos, document.find("old loose text"));
-	EXPECT_NE(std::string::npos, document.find("fresh"));
-}
-
-TEST_F(StoreQuick, TextFromOutsideNeverBreaksTheMemo)
-{
-	ASSERT_NE(nullptr, db());
-	// A control character is left out: the document still reads back, with the text.
-	ASSERT_TRUE(db()->addQuickMemo("one\x01two"));
-	std::vector<MemoTodoListItem> items;
-	ASSERT_TRUE(memoParseTodoListXml(quickColumn("tizenXmlContent").c_str(), items));
-	ASSERT_EQ(1u, items.size());
-	EXPECT_EQ("onetwo", items[0].content);
 
 	// A failed write stores nothing: the memo stays as it was.
 	const std::string before = quickColumn("tizenXmlContent") + quickColumn("strippedContent");
@@ -56,6 +37,12 @@ TEST_F(StoreQuick, TextFromOutsideNeverBreaksTheMemo)
 		EXPECT_FALSE(db()->addQuickMemo("lost"));
 	}
 	EXPECT_EQ(before, quickColumn("tizenXmlContent") + quickColumn("strippedContent"));
+
+	// A body without the closing root tag is replaced.
+	db()->excuteSql("UPDATE memo SET tizenXmlContent = 'old loose text' WHERE isQuick = 1");
+	ASSERT_TRUE(db()->addQuickMemo("fresh"));
+	EXPECT_EQ(std::string::npos, quickColumn("tizenXmlContent").find("old loose text"));
+	EXPECT_NE(std::string::npos, quickColumn("tizenXmlContent").find("fresh"));
 }
 
 TEST_F(StoreQuick, NoQuickMemoRowDropsTheText)

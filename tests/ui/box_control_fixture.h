@@ -52,6 +52,16 @@ protected:
 		return control;
 	}
 
+	// A fresh window and control, for a second set-up within one test.
+	MemoBoxControl *remakeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
+	{
+		UiFixture::TearDown();
+		UiFixture::SetUp();
+		keys.clear();
+		payloads.clear();
+		return makeControl(doc, mode, uuid);
+	}
+
 	std::vector<MemoBoxItem *> items() const
 	{
 		std::vector<MemoBoxItem *> result;

@@ -78,12 +78,11 @@ protected:
 };
 } // namespace
 
-TEST_F(EntryFilterImagesTest, ATagFromAnotherMemoIsCopiedIn)
+TEST_F(EntryFilterImagesTest, SizedTagsAreFittedAndTakenIntoTheMemo)
 {
 	const std::string source = elsewhere + "photo.png";
 	ASSERT_TRUE(writePicture(source, 200, 100));
 	item->insertText(fittedTag(source, 200, 100).c_str());
-
 	const std::string path = pathOf(text());
 	ASSERT_EQ(0u, path.find(folder)) << text();
 	EXPECT_TRUE(eina_str_has_extension(path.c_str(), ".png"));
@@ -91,80 +90,55 @@ TEST_F(EntryFilterImagesTest, ATagFromAnotherMemoIsCopiedIn)
 	EXPECT_TRUE(ecore_file_exists(source.c_str()));
 	EXPECT_EQ(0, owner->count("popup:"));
 
-	// A tag already at home stays as it is.
-	const std::string before = text();
+	// A tag already at home keeps its file; a width of another display is fitted to this one.
 	elm_entry_entry_set(item->getEntry(), "");
-	item->insertText(before.c_str());
-	EXPECT_EQ(before, text());
+	item->insertText(("<item size=100x90 vsize=full href=file://" + path + "></item>").c_str());
+	EXPECT_EQ(fittedTag(path, 200, 100), text());
 }
 
-TEST_F(EntryFilterImagesTest, AForeignWidthIsFittedToThisDisplay)
-{
-	ecore_file_mkpath(folder.c_str());
-	const std::string source = folder + "wide.png";
-	ASSERT_TRUE(writePicture(source, 200, 100));
-	item->insertText(("<item size=100x90 vsize=full href=file://" + source + "></item>").c_str());
-	EXPECT_EQ(fittedTag(source, 200, 100), text());
-}
-
-TEST_F(EntryFilterImagesTest, APasteOfTheFixedSizeIsRebuilt)
+TEST_F(EntryFilterImagesTest, APasteOfTheFixedSizeIsRebuiltWhenItsFileExists)
 {
 	const std::string source = elsewhere + "pasted.jpg";
 	ASSERT_TRUE(writePicture(source, 300, 200));
 	item->insertText(("a<item absize=240x180 href=file://" + source + "></item>b").c_str());
-
 	const std::string path = pathOf(text());
 	ASSERT_EQ(0u, path.find(folder)) << text();
 	EXPECT_TRUE(eina_str_has_extension(path.c_str(), ".jpg"));
 	EXPECT_EQ("a" + fittedTag(path, 300, 200) + "b", text());
-}
 
-TEST_F(EntryFilterImagesTest, APasteOfAMissingFileStaysAsItIs)
-{
+	elm_entry_entry_set(item->getEntry(), "");
 	item->insertText("<item absize=240x180 href=file:///nowhere/gone.jpg></item>");
 	EXPECT_EQ("<item absize=240x180 href=file:///nowhere/gone.jpg></item>", text());
 }
 
-TEST_F(EntryFilterImagesTest, TextWithALargePictureWaitsForTheWorker)
+TEST_F(EntryFilterImagesTest, LargePicturesAreShrunkOnWorkers)
 {
+	// A sized tag from elsewhere enters at once; its worker shrinks the copy behind the scenes.
+	const std::string big = elsewhere + "big.jpg";
+	ASSERT_TRUE(writePicture(big, 1000, 800));
+	item->insertText(fittedTag(big, 1000, 800).c_str());
+	const std::string copy = pathOf(text());
+	ASSERT_EQ(0u, copy.find(folder)) << text();
+	EXPECT_EQ(0, owner->count("popup:"));
+	int w = 0, h = 0;
+	ASSERT_TRUE(waitFor([&] { return pictureSize(copy, &w, &h) && w * h <= 320000; }, 20.0));
+
+	// Text with a pasted large picture waits for its worker; the popup covers the wait.
 	const std::string source = elsewhere + "large.jpg";
 	ASSERT_TRUE(writePicture(source, 1200, 900));
+	elm_entry_entry_set(item->getEntry(), "");
 	item->insertText(("hello<item absize=240x180 href=file://" + source + "></item>").c_str());
-
-	// Nothing yet: the popup covers the wait.
 	EXPECT_EQ("", text());
 	ASSERT_EQ(1, owner->count("popup:1"));
 	EXPECT_EQ(0, owner->count("popup:0"));
-
 	ASSERT_TRUE(waitFor([&] { return !text().empty(); }, 20.0));
 	EXPECT_EQ(0u, text().find("hello<item size="));
 	EXPECT_EQ(1, owner->count("popup:0"));
-
-	// The picture in the memo's folder has been shrunk below the insertion limit.
-	int w = 0, h = 0;
+	// The picture in the memo's folder has been shrunk below the insertion limit; the original is untouched.
 	ASSERT_TRUE(pictureSize(pathOf(text()), &w, &h));
 	EXPECT_LE(w * h, 320000);
-	// The pasted original is left untouched.
-	int sw = 0, sh = 0;
-	ASSERT_TRUE(pictureSize(source, &sw, &sh));
-	EXPECT_EQ(1200, sw);
-}
-
-TEST_F(EntryFilterImagesTest, ALargePictureFromElsewhereEntersAtOnce)
-{
-	const std::string source = elsewhere + "big.jpg";
-	ASSERT_TRUE(writePicture(source, 1000, 800));
-	item->insertText(fittedTag(source, 1000, 800).c_str());
-	const std::string path = pathOf(text());
-	ASSERT_EQ(0u, path.find(folder)) << text();
-	EXPECT_EQ(0, owner->count("popup:"));
-	// Its worker shrinks the copy behind the scenes.
-	ASSERT_TRUE(waitFor(
-	    [&] {
-		    int w = 0, h = 0;
-		    return pictureSize(path, &w, &h) && w * h <= 320000;
-	    },
-	    20.0));
+	ASSERT_TRUE(pictureSize(source, &w, &h));
+	EXPECT_EQ(1200, w);
 }
 
 TEST_F(EntryFilterImagesTest, AnItemDeletedDuringTheWaitIsLeftAlone)

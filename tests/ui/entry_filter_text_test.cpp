@@ -6,6 +6,7 @@
 
 #include <cstdio>
 
+#include "TestEnv.h"
 #include "support/FakeBoxOwner.h"
 #include "support/UiTestSupport.h"
 
@@ -41,13 +42,7 @@ protected:
 		return t ? t : "";
 	}
 
-	static int tagCount(const std::string &markup)
-	{
-		int n = 0;
-		for (size_t at = 0; (at = markup.find("<item", at)) != std::string::npos; at++)
-			n++;
-		return n;
-	}
+	static int tagCount(const std::string &markup) { return static_cast<int>(memo_test::countOf(markup, "<item")); }
 
 	// A tag whose file does not exist, so that no copy or size work gets in the way of the counting.
 	std::string ghostTag(int i) const
@@ -76,7 +71,7 @@ protected:
 };
 } // namespace
 
-TEST_F(EntryFilterTextTest, PastedLinesBecomeBreaksAndFormatGoes)
+TEST_F(EntryFilterTextTest, PastedTextLosesFormatNoBreakSpacesAndControlCharacters)
 {
 	EXPECT_EQ("one<br/>two<br/>three", insert("one\ntwo\nthree"));
 	EXPECT_EQ("big red<br/>left", insert("<font_size=40>big</font_size> <color=#ff0000>red</color><br/>"
@@ -85,10 +80,6 @@ TEST_F(EntryFilterTextTest, PastedLinesBecomeBreaksAndFormatGoes)
 	EXPECT_EQ("plain", insert("<+ font=Sans>plain</>"));
 	// Tags the filter does not know stay for the entry to judge.
 	EXPECT_EQ("x<tab/>y", insert("x<tab/>y"));
-}
-
-TEST_F(EntryFilterTextTest, NoBreakSpacesAndControlCharactersAreDropped)
-{
 	EXPECT_EQ("abcde", insert("a\xC2\xA0"
 	                          "b&nbsp;c&#160;d&#xa0;e"));
 	EXPECT_EQ("ab<br/>c", insert("a\x01"
@@ -110,11 +101,14 @@ TEST_F(EntryFilterTextTest, ReturnAfterAPictureKeepsItInPlace)
 	EXPECT_EQ(1, owner->count("add:1:"));
 }
 
-TEST_F(EntryFilterTextTest, NoBudgetNothingEntersAndAToastSaysSo)
+TEST_F(EntryFilterTextTest, NoBudgetNothingEntersAndTypingCountsNoImages)
 {
-	insert("kept");
+	insert("");
+	focus(item->getEntry());
+	typeText("kept");
+	EXPECT_EQ(0, owner->count("count"));
+	EXPECT_EQ(0, toastCount());
 	item->setLimit(0);
-	clearToasts();
 	item->insertText("more");
 	EXPECT_STREQ("kept", elm_entry_entry_get(item->getEntry()));
 	ASSERT_EQ(1, toastCount());
@@ -122,17 +116,15 @@ TEST_F(EntryFilterTextTest, NoBudgetNothingEntersAndAToastSaysSo)
 	EXPECT_EQ(0, owner->count("count"));
 }
 
-TEST_F(EntryFilterTextTest, UnclosedAndDoubleClosedTagsAreMended)
+TEST_F(EntryFilterTextTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
 {
 	ASSERT_GT(width, 1);
 	const std::string base = ghostOpen("file:///nowhere/a.png");
 	EXPECT_EQ(base + "></item>x", insert(base + ">x"));
 	EXPECT_EQ(base + "></item>x", insert(base + "></item></item>x"));
 	EXPECT_EQ(base + "></item>xy", insert(base + "></item>x</item>y</item>"));
-}
+	EXPECT_EQ("ab", insert("a<item size=10x10 vsize=full></item>b"));
 
-TEST_F(EntryFilterTextTest, ForbiddenSourceGoesOnlyInFront)
-{
 	const std::string web = ghostOpen("http://example.org/a.png") + "></item>";
 	const std::string data = ghostOpen("data:image/png;base64,AAAA") + "></item>";
 	const std::string good = ghostTag(1);
@@ -141,16 +133,12 @@ TEST_F(EntryFilterTextTest, ForbiddenSourceGoesOnlyInFront)
 	EXPECT_EQ(good + web, insert(good + web));
 }
 
-TEST_F(EntryFilterTextTest, TagsWithoutSourceAreDropped)
-{
-	EXPECT_EQ("ab", insert("a<item size=10x10 vsize=full></item>b"));
-}
-
-TEST_F(EntryFilterTextTest, TwelveIntoAnEmptyMemoKeepsEleven)
+TEST_F(EntryFilterTextTest, ImageCountLimits)
 {
 	std::string twelve;
 	for (int i = 0; i < 12; i++)
 		twelve += ghostTag(i);
+	// A memo with no images takes eleven, one toast for the rest.
 	owner->imageCount = -1;
 	const std::string kept = insert(twelve);
 	EXPECT_EQ(11, tagCount(kept));
@@ -158,30 +146,12 @@ TEST_F(EntryFilterTextTest, TwelveIntoAnEmptyMemoKeepsEleven)
 	EXPECT_EQ(std::string::npos, kept.find("/nowhere/11.png"));
 	ASSERT_EQ(1, toastCount());
 	EXPECT_EQ(limitToast(), toastAt(0));
-}
-
-TEST_F(EntryFilterTextTest, TwelveIntoAMemoWithOneKeepsNine)
-{
-	std::string twelve;
-	for (int i = 0; i < 12; i++)
-		twelve += ghostTag(i);
+	// A memo with one stops at ten in all.
 	owner->imageCount = 1;
 	EXPECT_EQ(9, tagCount(insert(twelve)));
-	EXPECT_EQ(1, toastCount());
-}
-
-TEST_F(EntryFilterTextTest, AFullMemoTakesNoImageAndToastsEachRefusal)
-{
+	EXPECT_EQ(2, toastCount());
+	// A full memo takes none, with a toast for each refusal.
 	owner->imageCount = 10;
 	EXPECT_EQ("ab", insert("a" + ghostTag(1) + ghostTag(2) + "b"));
-	EXPECT_EQ(2, toastCount());
-}
-
-TEST_F(EntryFilterTextTest, TypingDoesNotCountImages)
-{
-	focus(item->getEntry());
-	owner->calls.clear();
-	typeText("abc");
-	EXPECT_EQ(0, owner->count("count"));
-	EXPECT_EQ(0, toastCount());
+	EXPECT_EQ(4, toastCount());
 }
