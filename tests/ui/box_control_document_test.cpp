@@ -70,16 +70,13 @@ TEST_F(BoxControlDocumentTest, StoredDocumentComesBackByteForByteAndRenders)
 	ASSERT_TRUE(writeLandscape(lake, 1200, 520, 0x7fb6e0, 0x3f7a4a));
 	ASSERT_TRUE(writeLandscape(dusk, 1200, 520, 0xb06a8a, 0x4a3b5e));
 	// At scale 1.0 a text item shows pictures 628 wide: 520 * 628 / 1200 + 40 = 312.
-	const std::string xml = todoList(
+	const std::string lines =
 	    todoItem(0, false, "Friday at six &amp;amp; meet at the pier.&lt;br/&gt;" + escapedTag(628, 312, lake)) +
 	    todoItem(1, true, "Sleeping bags") + todoItem(1, false, "Camera batteries") + todoItem(1, false, "Sunscreen") +
-	    todoItem(0, false, "Sunset from the dock:&lt;br/&gt;" + escapedTag(628, 312, dusk) + "see you"));
-	MemoDocInfo doc;
-	doc.setMemoUUID("box-test-memo");
-	doc.setTitle("Weekend at the lake");
-	doc.setTizenXmlContent(xml.c_str());
-	doc.setIsFavorite(1);
-	makeControl(&doc, MODE_UPDATE);
+	    todoItem(0, false, "Sunset from the dock:&lt;br/&gt;" + escapedTag(628, 312, dusk) + "see you");
+	record.setTitle("Weekend at the lake");
+	record.setIsFavorite(1);
+	withBody(lines);
 
 	ASSERT_EQ(5u, items().size());
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, items()[0]->getType());
@@ -94,7 +91,7 @@ TEST_F(BoxControlDocumentTest, StoredDocumentComesBackByteForByteAndRenders)
 	char *title = control->getTitleTextN();
 	EXPECT_STREQ("Weekend at the lake", title);
 	free(title);
-	EXPECT_EQ(xml, document(control));
+	EXPECT_EQ(todoList(lines), document(control));
 
 	runFor(0.5);
 	render();
@@ -111,17 +108,14 @@ TEST_F(BoxControlDocumentTest, StoredDocumentComesBackByteForByteAndRenders)
 
 TEST_F(BoxControlDocumentTest, UnknownTypesAndUnreadableDocuments)
 {
-	MemoDocInfo doc;
-	doc.setTizenXmlContent(
-	    todoList(todoItem(2, false, "dropped") + todoItem(1, false, "a") + todoItem(0, false, "b")).c_str());
-	makeControl(&doc, MODE_UPDATE);
+	withBody(todoItem(2, false, "dropped") + todoItem(1, false, "a") + todoItem(0, false, "b"));
 	ASSERT_EQ(2u, items().size());
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, items()[0]->getType());
 	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, items()[1]->getType());
 
 	// What cannot be read opens as one empty item.
-	doc.setTizenXmlContent("this is not xml");
-	remakeControl(&doc, MODE_UPDATE);
+	record.setTizenXmlContent("this is not xml");
+	remakeControl(&record, MODE_UPDATE);
 	ASSERT_EQ(1u, items().size());
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, items()[0]->getType());
 	EXPECT_EQ("", document(control));
@@ -129,9 +123,7 @@ TEST_F(BoxControlDocumentTest, UnknownTypesAndUnreadableDocuments)
 
 TEST_F(BoxControlDocumentTest, OnlyTextThatShowsIsWrittenAndAlwaysReadable)
 {
-	MemoDocInfo doc;
-	doc.setTizenXmlContent(todoList(todoItem(0, false, "keep") + todoItem(1, true, "x")).c_str());
-	makeControl(&doc, MODE_UPDATE);
+	withBody(todoItem(0, false, "keep") + todoItem(1, true, "x"));
 	ASSERT_EQ(2u, items().size());
 	Evas_Object *first = items()[0]->getEntry();
 	Evas_Object *second = items()[1]->getEntry();
@@ -169,10 +161,8 @@ TEST_F(BoxControlDocumentTest, OnlyTextThatShowsIsWrittenAndAlwaysReadable)
 
 TEST_F(BoxControlDocumentTest, ViewModeItemsAreReadOnlyAndAnEmptyQuickMemoHasAQuickBody)
 {
-	MemoDocInfo doc;
-	doc.setTitle("Read me");
-	doc.setTizenXmlContent(todoList(todoItem(0, false, "body")).c_str());
-	makeControl(&doc, MODE_VIEW);
+	record.setTitle("Read me");
+	withBody(todoItem(0, false, "body"), MODE_VIEW);
 	// A title that cannot be edited has no entry; its text still reads back.
 	EXPECT_EQ(nullptr, control->getTitleItem()->getEntry());
 	char *title = control->getTitleTextN();
@@ -182,9 +172,9 @@ TEST_F(BoxControlDocumentTest, ViewModeItemsAreReadOnlyAndAnEmptyQuickMemoHasAQu
 	EXPECT_FALSE(elm_entry_editable_get(items()[0]->getEntry()));
 	EXPECT_EQ(todoList(todoItem(0, false, "body")), document(control));
 
-	MemoDocInfo quick;
-	quick.setIsQuick(1);
-	remakeControl(&quick, MODE_VIEW);
+	record.setIsQuick(1);
+	record.setTizenXmlContent("");
+	remakeControl(&record, MODE_VIEW);
 	EXPECT_EQ(MEMO_BOX_ITEM_QUICK_TITLE, control->getTitleItem()->getType());
 	ASSERT_EQ(1u, items().size());
 	EXPECT_EQ(MEMO_BOX_ITEM_QUICK_TEXT, items()[0]->getType());

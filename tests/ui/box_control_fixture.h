@@ -52,6 +52,10 @@ protected:
 		return control;
 	}
 
+	// A control in `mode` on `record`, whose body becomes `lines` (todolist items); a second call
+	// within one test starts on a fresh window.
+	MemoBoxControl *withBody(const std::string &lines, int mode = MODE_UPDATE);
+
 	// A fresh window and control, for a second set-up within one test.
 	MemoBoxControl *remakeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
 	{
@@ -116,6 +120,7 @@ protected:
 	}
 
 	MemoBoxControl *control = nullptr;
+	MemoDocInfo record;
 	std::vector<std::string> keys;
 	std::vector<std::string> payloads;
 };
@@ -137,6 +142,13 @@ inline std::string escapedTag(int w, int h, const std::string &path)
 {
 	return "&lt;item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path +
 	       "&gt;&lt;/item&gt;&lt;br/&gt;";
+}
+
+inline MemoBoxControl *BoxControlFixture::withBody(const std::string &lines, int mode)
+{
+	record.setMemoUUID("box-test-memo");
+	record.setTizenXmlContent(todoList(lines).c_str());
+	return control ? remakeControl(&record, mode) : makeControl(&record, mode);
 }
 
 } // namespace memo_ui_test

@@ -16,14 +16,6 @@ namespace
 class BoxControlItemsTest : public BoxControlFixture
 {
 protected:
-	// A control in `mode` on a record whose body is `lines` (todolist items).
-	MemoBoxControl *withBody(const std::string &lines, int mode = MODE_UPDATE)
-	{
-		doc.setMemoUUID("box-test-memo");
-		doc.setTizenXmlContent(todoList(lines).c_str());
-		return control ? remakeControl(&doc, mode) : makeControl(&doc, mode);
-	}
-
 	// Focuses the item's entry and puts the cursor at `pos` (-1: the end).
 	void focusAt(MemoBoxItem *item, int pos)
 	{
@@ -49,8 +41,6 @@ protected:
 		centreOf(obj, &x, &y);
 		tap(x, y);
 	}
-
-	MemoDocInfo doc;
 };
 } // namespace
 
@@ -188,8 +178,8 @@ TEST_F(BoxControlItemsTest, DoneFollowsTheBodyAndInNewModesTheTitle)
 	EXPECT_EQ("action,done,enable", lastKey());
 
 	// Updating the quick memo, the title counts for nothing.
-	doc.setIsQuick(1);
-	doc.setTitle("Quick");
+	record.setIsQuick(1);
+	record.setTitle("Quick");
 	withBody(todoItem(0, false, "x"));
 	focusAt(items()[0], -1);
 	pressKey("BackSpace", "\b");
