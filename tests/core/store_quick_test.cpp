@@ -45,22 +45,7 @@ TEST_F(StoreQuick, AppendedTextsKeepTheirOrderAndNothingBreaksTheMemo)
 	EXPECT_NE(std::string::npos, quickColumn("tizenXmlContent").find("fresh"));
 }
 
-TEST_F(StoreQuick, NoQuickMemoRowDropsTheText)
-{
-	vconf_set_int("db/desktop/csc/feature_92", 0);
-	ASSERT_NE(nullptr, db());
-	EXPECT_FALSE(db()->addQuickMemo("lost"));
-
-	// Removed like any memo, it is not made again.
-	vconf_unset("db/desktop/csc/feature_92");
-	MemoDbMgr::destroy();
-	unlink(dbPath().c_str());
-	ASSERT_NE(nullptr, db());
-	ASSERT_TRUE(db()->removeMemo(quickColumn("UUID").c_str()));
-	EXPECT_FALSE(db()->addQuickMemo("lost"));
-}
-
-TEST_F(StoreQuick, InitEmptiesRowOneOnly)
+TEST_F(StoreQuick, InitEmptiesRowOneOnlyAndWithoutTheRowTextIsDropped)
 {
 	ASSERT_NE(nullptr, db());
 	ASSERT_TRUE(db()->addQuickMemo("some text"));
@@ -75,12 +60,16 @@ TEST_F(StoreQuick, InitEmptiesRowOneOnly)
 	EXPECT_EQ(title, quickColumn("title"));
 	EXPECT_EQ("252;191;169;255;", quickColumn("bgColor"));
 	EXPECT_EQ("1", quickColumn("isDirty"));
+	// Removed like any memo, the row is not made again, and text for it is dropped.
+	ASSERT_TRUE(db()->removeMemo(uuid.c_str()));
+	EXPECT_FALSE(db()->addQuickMemo("lost"));
 
-	// With the feature off at first run, row one is a normal memo, and it is the one emptied.
+	// With the feature off at first run there is no quick memo: row one is a normal memo, the one emptied.
 	MemoDbMgr::destroy();
 	unlink(dbPath().c_str());
 	vconf_set_int("db/desktop/csc/feature_92", 0);
 	addMemo("normal", "precious words", 1000);
+	EXPECT_FALSE(db()->addQuickMemo("lost"));
 	ASSERT_TRUE(db()->initQuickMemo());
 	EXPECT_EQ("", query("SELECT strippedContent FROM memo WHERE _id = 1"));
 	EXPECT_EQ("normal", query("SELECT title FROM memo WHERE _id = 1"));

@@ -188,7 +188,7 @@ TEST_F(BoxControlItemsTest, DoneFollowsTheBodyAndInNewModesTheTitle)
 	EXPECT_EQ("action,done,enable", lastKey());
 }
 
-TEST_F(BoxControlItemsTest, KeypadHoldFollowsTheFocusedItemAndGuideTextALoneFirstItem)
+TEST_F(BoxControlItemsTest, KeypadHoldGuideTextAndTapsFollowTheModeAndTheItems)
 {
 	makeControl(nullptr, MODE_NEW);
 	MemoBoxItem *first = items()[0];
@@ -211,14 +211,10 @@ TEST_F(BoxControlItemsTest, KeypadHoldFollowsTheFocusedItemAndGuideTextALoneFirs
 	runFor(0.05);
 	control->onCheckGuideText(first);
 	EXPECT_STREQ("", elm_object_part_text_get(body, "elm.guide"));
-}
 
-TEST_F(BoxControlItemsTest, TapsAskForEditingOnlyInViewMode)
-{
-	withBody(todoItem(0, false, "editable"));
-	tapOn(items()[0]->getEntry());
+	// A tap asks for editing only in view mode, where the keypad is never held.
+	tapOn(body);
 	EXPECT_EQ(0, countKey("action,mode,change"));
-
 	withBody(todoItem(0, false, "read only"), MODE_VIEW);
 	control->suspendKeypad();
 	EXPECT_TRUE(elm_entry_input_panel_enabled_get(items()[0]->getEntry()));
