@@ -88,8 +88,10 @@ public:
 	const Eina_List *getItemList() const { return __itemList; }
 	int getMode() const { return __mode; }
 
-	// The todolist document of the body items: empty items are skipped, and a body of empty items
-	// gives "". Never null; the caller frees it.
+	// The todolist document of the body items: items whose entry shows no text (format tags alone
+	// count as none) are skipped, and a body of empty items gives "". Null when the document could
+	// not be written (logged): a save must then fail and leave the stored memo as it was. The
+	// caller frees it.
 	char *getTodoListXmlN();
 	// The title as plain UTF-8, or null when it is empty. The caller frees it.
 	char *getTitleTextN();
@@ -121,6 +123,8 @@ private:
 	void __appendItem(MemoBoxItem *item);
 	// Whether `item` is the title item or one of the body items (it may have gone meanwhile).
 	bool __isLiveItem(const MemoBoxItem *item) const;
+	// Gives `item` what the shared body budget leaves it beside the other items of the list.
+	void __applyBudget(MemoBoxItem *item);
 	bool __areBodyItemsEmpty() const;
 	void __emitDoneState(bool allEmpty);
 	bool __isEditable() const { return __mode != MODE_VIEW; }

@@ -60,8 +60,9 @@ public:
 	char *getContentMarkupN();
 	// Replaces the entry's character limit by `maxChars` characters (no byte limit).
 	void setLimit(int maxChars);
-	// True when the entry holds no text at all. Unlike elm_entry_is_empty it never moves the cursor
-	// (which that call does when a change notice is still pending). Null counts as empty.
+	// True when the entry shows no text, as elm_entry_is_empty says: format tags alone (left behind
+	// by deleted text) are empty, a break or a picture is not. Unlike that call it never moves the
+	// cursor (which it does when a change notice is still pending). Null counts as empty.
 	static bool isEntryEmpty(Evas_Object *entry);
 	// The next mouse up on the entry is ignored.
 	void setIgnoreMouseUp(bool ignore) { __ignoreMouseUp = ignore; }

@@ -33,12 +33,13 @@ public:
 	~MemoTodoListWriter();
 
 	// Adds one item: check kinds write type "1" and their state, every other kind "0" and
-	// "false". `contentMarkup` is the item's saved markup; null counts as empty. False if the
-	// writer failed (logged).
+	// "false". `contentMarkup` is the item's saved markup; null counts as empty; control characters
+	// that XML cannot carry are left out. False if the writer failed (logged).
 	bool addItem(_MemoBoxItemType type, bool checked, const char *contentMarkup);
 
 	// Ends the document and returns it from "<todolist>" on, cut to 40959 bytes; the empty string
-	// when no item was added or the writer failed. Never null; the caller frees it. Call once.
+	// when no item was added. Null when the writer failed at any step (logged), so that a caller
+	// never stores an empty body in place of a memo. The caller frees it. Call once.
 	char *finishN();
 
 private:
@@ -50,7 +51,8 @@ private:
 	bool __failed;
 };
 
-// Writes `items` in order, skipping those with empty content. Never null; the caller frees it.
+// Writes `items` in order, skipping those with empty content. Null when the writer failed (logged);
+// the caller frees it.
 char *memoComposeTodoListXmlN(const std::vector<MemoTodoListItem> &items);
 
 // Reads a document for MemoBoxControl::__composeBoxItemFromXml with the libxml2 text reader

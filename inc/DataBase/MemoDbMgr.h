@@ -93,8 +93,9 @@ public:
 
 	// ---- Quick memo and PIN ----
 
-	// Appends text as a last plain text item (type 0, not a check item) of the quick memo; false when
-	// there is not exactly one quick memo. No change notice.
+	// Appends text as a last plain text item (type 0, not a check item) of the quick memo, control
+	// characters left out; false when there is not exactly one quick memo, or when the document could
+	// not be written (logged; the stored memo stays as it was). No change notice.
 	bool addQuickMemo(const char *text);
 	// Empties the body of the row with _id 1 (the quick memo when the feature was on at first run).
 	bool initQuickMemo();

@@ -48,6 +48,14 @@ public:
 	// True on the sales code "KTC".
 	static bool isSalesCodeKTC();
 
+	// ---- Text that enters the system (MemoUtilText.cpp) ----
+
+	// A copy of `text` that every stored document can carry: control characters other than tab and
+	// newline, U+FFFE, U+FFFF and bytes that are not UTF-8 are dropped; CR LF and a lone CR become
+	// a newline. For text from outside (a share,
+	// a quick memo append) and from the keyboard or a paste. Null for a null text; the caller frees.
+	static char *stripControlCharsN(const char *text);
+
 	// ---- Image processing (MemoUtilImage.cpp) ----
 	// resizeImageJpg, resizeImagePng, getOrient and rotateImage use no shared state and may run on
 	// any thread. getInsertImageSize and resizeImage use an Evas canvas; called off the main loop they

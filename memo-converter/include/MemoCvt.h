@@ -37,7 +37,9 @@
 //
 // tizenXmlContent (getTizenXmlContent): the todolist document of the items above, written with
 //   the editor's grammar: no declaration, "<todolist>", one self-closed todolist_item per line,
-//   "</todolist>" and a newline. Empty items are kept. No items: the empty string.
+//   "</todolist>" and a newline. Empty items are kept; characters XML cannot carry are left out.
+//   No items: the empty string. The empty string for a body with items means that the XML
+//   writer failed (logged).
 //
 // display_Content (getDisplayContent): content for previews. A check item is
 //   "<CHECK state=true>" or "<CHECK state=false>", its text on one line, "</CHECK>". A text item is
@@ -74,8 +76,10 @@ public:
 	// The quick memo append: `text` is the plain UTF-8 text that was just appended to the source
 	// as its last, unescaped text item ("&" may already stand as "&amp;"). The item is rebuilt
 	// from `text` so that the body holds it exactly once as a text item, whatever the text held
-	// (quotes, angle brackets, line breaks). When the source does not end with that item, the
-	// text is appended as a new last item.
+	// (quotes, angle brackets, line breaks); control characters XML cannot carry are left out.
+	// What stood behind the item (the rest of a document that went on after its first root) is
+	// not part of the body. When the source holds no such item, the text is appended as a new
+	// last item.
 	void addQuickMemoItem(std::string text);
 
 private:

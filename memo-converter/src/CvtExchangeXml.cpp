@@ -15,14 +15,15 @@ int __writeRun(xmlTextWriterPtr writer, const CvtRun &run)
 	int rc;
 	switch (run.kind) {
 	case CvtRun::TEXT:
-		return xmlTextWriterWriteString(writer, BAD_CAST cvtValidUtf8(run.text, true).c_str());
+		return xmlTextWriterWriteString(writer, BAD_CAST cvtValidUtf8(run.text, CVT_XML_REPLACE).c_str());
 	case CvtRun::BREAK:
 		rc = xmlTextWriterStartElement(writer, BAD_CAST "br");
 		return rc < 0 ? rc : xmlTextWriterEndElement(writer);
 	case CvtRun::IMAGE:
 		rc = xmlTextWriterStartElement(writer, BAD_CAST "image");
 		if (rc >= 0)
-			rc = xmlTextWriterWriteAttribute(writer, BAD_CAST "href", BAD_CAST cvtValidUtf8(run.text, true).c_str());
+			rc = xmlTextWriterWriteAttribute(writer, BAD_CAST "href",
+			                                 BAD_CAST cvtValidUtf8(run.text, CVT_XML_REPLACE).c_str());
 		if (rc >= 0)
 			rc = xmlTextWriterWriteFormatAttribute(writer, BAD_CAST "width", "%d", run.width);
 		if (rc >= 0)

@@ -45,7 +45,7 @@ std::string cvtContentText(const CvtItemList &items)
 		else
 			out += __itemText(item);
 	}
-	return cvtValidUtf8(out, false);
+	return cvtValidUtf8(out, CVT_XML_KEEP);
 }
 
 std::string cvtDisplayText(const CvtItemList &items)
@@ -63,7 +63,7 @@ std::string cvtDisplayText(const CvtItemList &items)
 				out += '\n';
 		}
 	}
-	return cvtValidUtf8(out, false);
+	return cvtValidUtf8(out, CVT_XML_KEEP);
 }
 
 std::string cvtStrippedText(const CvtItemList &items)
@@ -74,5 +74,5 @@ std::string cvtStrippedText(const CvtItemList &items)
 			out += '\n';
 		out += __itemText(items[i]);
 	}
-	return cvtValidUtf8(out, false);
+	return cvtValidUtf8(out, CVT_XML_KEEP);
 }

@@ -123,7 +123,8 @@ std::string cvtWriteTodoList(const CvtItemList &items)
 		rc = xmlTextWriterStartElement(writer, BAD_CAST "todolist");
 	for (size_t i = 0; rc >= 0 && i < items.size(); ++i) {
 		const CvtItem &item = items[i];
-		const std::string content = cvtValidUtf8(item.markup, true);
+		// Left out rather than replaced: the stored document keeps what the editor can show.
+		const std::string content = cvtValidUtf8(item.markup, CVT_XML_DROP);
 		rc = xmlTextWriterStartElement(writer, BAD_CAST "todolist_item");
 		if (rc >= 0)
 			rc = xmlTextWriterWriteAttribute(writer, BAD_CAST "todo_item_type", BAD_CAST(item.isCheck ? "1" : "0"));

@@ -43,7 +43,7 @@ bool __xmlAllows(unsigned long cp)
 }
 } // namespace
 
-std::string cvtValidUtf8(const std::string &in, bool forXml)
+std::string cvtValidUtf8(const std::string &in, CvtXmlChars xmlChars)
 {
 	std::string out;
 	out.reserve(in.size());
@@ -60,10 +60,10 @@ std::string cvtValidUtf8(const std::string &in, bool forXml)
 			++i;
 			continue;
 		}
-		if (forXml && !__xmlAllows(cp))
-			out += REPLACEMENT;
-		else
+		if (xmlChars == CVT_XML_KEEP || __xmlAllows(cp))
 			out.append(in, i, len);
+		else if (xmlChars == CVT_XML_REPLACE)
+			out += REPLACEMENT;
 		i += len;
 	}
 	return out;

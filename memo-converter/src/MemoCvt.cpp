@@ -6,22 +6,13 @@
 #include "CvtMarkup.h"
 #include "CvtTextForms.h"
 #include "CvtTodoList.h"
+#include "CvtUtf8.h"
 
 namespace
 {
 // What the quick memo append writes around its text, unescaped.
 const char QUICK_ITEM_HEAD[] = "<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"";
 const char QUICK_ITEM_TAIL[] = "\"/></todolist>";
-
-// Where `tail` stands at the end of `s`, trailing white space aside; npos if it does not.
-size_t __tailPosition(const std::string &s, const std::string &tail)
-{
-	const size_t end = s.find_last_not_of(" \t\r\n");
-	if (end == std::string::npos || end + 1 < tail.size())
-		return std::string::npos;
-	const size_t pos = end + 1 - tail.size();
-	return s.compare(pos, tail.size(), tail) == 0 ? pos : std::string::npos;
-}
 } // namespace
 
 MemoCvt::MemoCvt(_MemoCvtSrcDbType type, std::string source) : __source(std::move(source))
@@ -64,13 +55,16 @@ std::string MemoCvt::getStrippedContent()
 void MemoCvt::addQuickMemoItem(std::string text)
 {
 	// The appended item carries the text unescaped, so it may have cut the read short or come
-	// back changed: read the document as it was before the append and add the text properly.
+	// back changed: read the document as it was before the append and add the text properly. The
+	// append took the place of the first "</todolist>", which need not end the document, so the
+	// item is looked for wherever it stands; what stood behind that root was never part of the body.
 	const std::string appended = QUICK_ITEM_HEAD + text + QUICK_ITEM_TAIL;
-	const size_t pos = __tailPosition(__source, appended);
+	const size_t pos = __source.find(appended);
 	if (pos != std::string::npos)
 		__items = cvtReadTodoList(__source.substr(0, pos) + "</todolist>");
 	CvtItem item;
-	item.markup = cvtPlainToMarkup(text);
+	// Control characters would make the stored document unreadable.
+	item.markup = cvtPlainToMarkup(cvtValidUtf8(text, CVT_XML_DROP));
 	__items.push_back(item);
 	CVT_LOGI("quick memo item added, %zu items", __items.size());
 }

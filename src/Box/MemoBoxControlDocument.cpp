@@ -31,15 +31,18 @@ char *MemoBoxControl::getTodoListXmlN()
 	MemoTodoListWriter writer;
 	Eina_List *l = nullptr;
 	void *data = nullptr;
-	EINA_LIST_FOREACH(__itemList, l, data) {
+	EINA_LIST_FOREACH(__itemList, l, data)
+	{
 		MemoBoxItem *item = static_cast<MemoBoxItem *>(data);
 		if (!item->getEntry() || MemoBoxItem::isEntryEmpty(item->getEntry()))
 			continue;
 		const _MemoBoxItemType type = item->getType();
 		const bool checked = memoBoxItemIsCheck(type) && item->getCheckStatus();
 		char *markup = item->getContentMarkupN();
-		writer.addItem(type, checked, markup);
+		const bool added = writer.addItem(type, checked, markup);
 		free(markup);
+		if (!added)
+			break;
 	}
 	return writer.finishN();
 }

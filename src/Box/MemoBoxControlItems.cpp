@@ -61,15 +61,15 @@ MemoBoxItem *MemoBoxControl::onAddRequested(Evas_Object *entry, _MemoBoxItemType
 	// After the asking entry has finished its event: its input panel back on, focus to the new item.
 	MemoBoxItem *asking = static_cast<MemoBoxItem *>(item);
 	app_assist::WUiTimer::addTimer(
-		0.0,
-		[this, asking, added](void *) {
-			if (__isLiveItem(asking) && asking->getEntry())
-				elm_entry_input_panel_enabled_set(asking->getEntry(), EINA_TRUE);
-			if (__isLiveItem(added) && added->getEntry())
-				elm_object_focus_set(added->getEntry(), EINA_TRUE);
-			return false;
-		},
-		nullptr, added->getLayout());
+	    0.0,
+	    [this, asking, added](void *) {
+		    if (__isLiveItem(asking) && asking->getEntry())
+			    elm_entry_input_panel_enabled_set(asking->getEntry(), EINA_TRUE);
+		    if (__isLiveItem(added) && added->getEntry())
+			    elm_object_focus_set(added->getEntry(), EINA_TRUE);
+		    return false;
+	    },
+	    nullptr, added->getLayout());
 	return added;
 }
 
@@ -91,7 +91,8 @@ void MemoBoxControl::onUnpackRequested(Evas_Object *entry, void *item)
 	Eina_List *l = nullptr;
 	void *data = nullptr;
 	bool found = false;
-	EINA_LIST_FOREACH(__itemList, l, data) {
+	EINA_LIST_FOREACH(__itemList, l, data)
+	{
 		if (data == removed) {
 			found = true;
 			break;
@@ -115,10 +116,21 @@ void MemoBoxControl::onUnpackRequested(Evas_Object *entry, void *item)
 		neighbour = static_cast<MemoBoxItem *>(eina_list_nth(__itemList, index - 1));
 	}
 
+	// The removed item leaves the list before the neighbour takes focus, so that the budget and the
+	// picture count see its text once, as the merged text: counted twice, the merge would be cut
+	// short and its pictures refused.
+	eina_list_free(__itemList);
+	__itemList = remaining;
+	if (__currentItem == removed)
+		__currentItem = neighbour;
+	if (__holdItem == removed)
+		__holdItem = nullptr;
+
 	int position = 0;
 	Evas_Object *target = neighbour->getEntry();
 	if (target) {
 		elm_object_focus_set(target, EINA_TRUE);
+		__applyBudget(neighbour);
 		elm_entry_cursor_end_set(target);
 		position = elm_entry_cursor_pos_get(target);
 	}
@@ -136,13 +148,7 @@ void MemoBoxControl::onUnpackRequested(Evas_Object *entry, void *item)
 		elm_box_unpack(box, removed->getLayout());
 		evas_object_del(removed->getLayout());
 	}
-	if (__currentItem == removed)
-		__currentItem = neighbour;
-	if (__holdItem == removed)
-		__holdItem = nullptr;
 	delete removed;
-	eina_list_free(__itemList);
-	__itemList = remaining;
 	evas_object_show(box);
 }
 
@@ -156,17 +162,24 @@ void MemoBoxControl::onFocusChanged(Evas_Object *entry, void *item)
 		MEMO_LOGE("data(focused item) is NULL");
 		return;
 	}
+	// The quick memo's title (type 4) counts as a title too, though only type 3 is named for this: it
+	// is not in the list, so as the current item it would take pictures, new items and the checklist
+	// toggle meant for the body, and its own 128-character limit would meet the body's budget.
 	if (isTitleType(focused->getType())) {
 		__isTitleFocused = true;
 		return;
 	}
 	__currentItem = focused;
 	__isTitleFocused = false;
+	__applyBudget(focused);
+}
 
+void MemoBoxControl::__applyBudget(MemoBoxItem *item)
+{
 	int sum = 0;
 	Eina_List *l = nullptr;
 	void *data = nullptr;
 	EINA_LIST_FOREACH(__itemList, l, data)
 	sum += plainLength(static_cast<MemoBoxItem *>(data));
-	focused->setLimit(BODY_CHAR_BUDGET - sum + plainLength(focused));
+	item->setLimit(BODY_CHAR_BUDGET - sum + plainLength(item));
 }

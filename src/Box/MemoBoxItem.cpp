@@ -198,8 +198,15 @@ void MemoBoxItem::setLimit(int maxChars)
 
 bool MemoBoxItem::isEntryEmpty(Evas_Object *entry)
 {
-	const char *text = entry ? elm_entry_entry_get(entry) : nullptr;
-	return !text || !*text;
+	const char *markup = entry ? elm_entry_entry_get(entry) : nullptr;
+	if (!markup || !*markup)
+		return true;
+	// Format tags left behind by deleted text show nothing; breaks, tabs and pictures come out as
+	// characters of their own.
+	char *plain = elm_entry_markup_to_utf8(markup);
+	const bool empty = !plain || !*plain;
+	free(plain);
+	return empty;
 }
 
 void MemoBoxItem::__onLayoutDelCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo)

@@ -12,6 +12,7 @@
 #include "MemoBoxItemPrivate.h"
 #include "MemoEntryFilterTags.h"
 #include "MemoLog.h"
+#include "Util/MemoUtil.h"
 
 namespace
 {
@@ -167,9 +168,14 @@ void MemoBoxItem::__entryFilter(void *data, Evas_Object *entry, char **text)
 		return;
 	}
 
-	std::string work = stripForeignTags(*text);
+	// Typed and pasted text alike: a control character would leave a document that cannot be read.
+	char *storable = MemoUtil::stripControlCharsN(*text);
+	std::string work = stripForeignTags(storable ? storable : *text);
+	free(storable);
 	memoBoxReplaceAll(work, "\n", MEMO_BOX_LINE_BREAK);
-	memoBoxReplaceAll(work, "\xC2\xA0", "");
+	// The no-break space stands for a picture when an item is split, in any of its forms.
+	for (const char *nbsp : {"\xC2\xA0", "&nbsp;", "&#160;", "&#xA0;", "&#xa0;"})
+		memoBoxReplaceAll(work, nbsp, "");
 	closeItemTags(work);
 	dropStrayCloses(work);
 	dropForbiddenLeadingTags(work, "href=http");
@@ -188,6 +194,8 @@ void MemoBoxItem::__entryFilter(void *data, Evas_Object *entry, char **text)
 		*text = strdup(work.c_str());
 		return;
 	}
+	// Appended rather than replaced: a second insertion that arrives while the first still waits
+	// for its workers would otherwise drop the first one's text.
 	self->__pendingText += work;
 	self->__queueResizeWorkers(queue);
 }

@@ -1,6 +1,7 @@
 #include "Box/MemoTodoListDocument.h"
 
 #include "MemoLog.h"
+#include "Util/MemoUtil.h"
 
 #include <cstdlib>
 #include <cstring>
@@ -39,12 +40,21 @@ bool MemoTodoListWriter::addItem(_MemoBoxItemType type, bool checked, const char
 		return false;
 	const bool isCheck = memoBoxItemIsCheck(type);
 	const char *state = isCheck && checked ? "true" : "false";
-	if (xmlTextWriterStartElement(__writer, BAD_CAST "todolist_item") < 0 ||
-	    xmlTextWriterWriteAttribute(__writer, BAD_CAST "todo_item_type", BAD_CAST(isCheck ? "1" : "0")) < 0 ||
-	    xmlTextWriterWriteAttribute(__writer, BAD_CAST "todo_item_state", BAD_CAST state) < 0 ||
-	    xmlTextWriterWriteAttribute(__writer, BAD_CAST "todo_item_content",
-	                                BAD_CAST(contentMarkup ? contentMarkup : "")) < 0 ||
-	    xmlTextWriterEndElement(__writer) < 0) {
+	// A control character would make the whole document unreadable: the memo would reopen empty.
+	char *content = MemoUtil::stripControlCharsN(contentMarkup ? contentMarkup : "");
+	if (!content) {
+		MEMO_LOGE("out of memory");
+		__failed = true;
+		return false;
+	}
+	const bool written =
+	    xmlTextWriterStartElement(__writer, BAD_CAST "todolist_item") >= 0 &&
+	    xmlTextWriterWriteAttribute(__writer, BAD_CAST "todo_item_type", BAD_CAST(isCheck ? "1" : "0")) >= 0 &&
+	    xmlTextWriterWriteAttribute(__writer, BAD_CAST "todo_item_state", BAD_CAST state) >= 0 &&
+	    xmlTextWriterWriteAttribute(__writer, BAD_CAST "todo_item_content", BAD_CAST content) >= 0 &&
+	    xmlTextWriterEndElement(__writer) >= 0;
+	free(content);
+	if (!written) {
 		MEMO_LOGE("xmlTextWriter item failed");
 		__failed = true;
 		return false;
@@ -54,16 +64,24 @@ bool MemoTodoListWriter::addItem(_MemoBoxItemType type, bool checked, const char
 
 char *MemoTodoListWriter::finishN()
 {
-	char *result = static_cast<char *>(calloc(MEMO_TODOLIST_BUFFER_SIZE, 1));
-	if (!result)
+	// An empty result would store an empty body over the memo: a failed write gives none at all.
+	if (__failed || !__writer) {
+		MEMO_LOGE("todolist document not written");
 		return nullptr;
-	if (__failed || !__writer)
-		return result;
-	xmlTextWriterEndElement(__writer);
-	xmlTextWriterEndDocument(__writer);
+	}
+	const bool ended = xmlTextWriterEndElement(__writer) >= 0 && xmlTextWriterEndDocument(__writer) >= 0;
 	// The writer flushes into the buffer when freed.
 	xmlFreeTextWriter(__writer);
 	__writer = nullptr;
+	if (!ended) {
+		MEMO_LOGE("xmlTextWriter end failed");
+		return nullptr;
+	}
+	char *result = static_cast<char *>(calloc(MEMO_TODOLIST_BUFFER_SIZE, 1));
+	if (!result) {
+		MEMO_LOGE("out of memory");
+		return nullptr;
+	}
 	const char *text = reinterpret_cast<const char *>(xmlBufferContent(__buffer));
 	// With no item the root is self-closed, "<todolist>" is not found, and the body stores nothing.
 	const char *root = text ? strstr(text, "<todolist>") : nullptr;
@@ -76,8 +94,8 @@ char *memoComposeTodoListXmlN(const std::vector<MemoTodoListItem> &items)
 {
 	MemoTodoListWriter writer;
 	for (const MemoTodoListItem &item : items) {
-		if (!item.content.empty())
-			writer.addItem(item.type, item.checked, item.content.c_str());
+		if (!item.content.empty() && !writer.addItem(item.type, item.checked, item.content.c_str()))
+			break;
 	}
 	return writer.finishN();
 }

@@ -94,10 +94,17 @@ bool MemoDbMgr::addQuickMemo(const char *text)
 		}
 	}
 
+	// Text from other applications may hold control characters, which would leave a document that
+	// cannot be read back: the memo would open empty.
+	std::unique_ptr<char, decltype(&free)> storable(MemoUtil::stripControlCharsN(text), free);
+	if (!storable) {
+		MEMO_LOGE("out of memory");
+		return false;
+	}
 	// The text becomes the last unchecked item; it goes in unescaped, as the converter expects.
 	std::string item =
-	    std::string("<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"") + text +
-	    "\"/></todolist>";
+	    std::string("<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"") +
+	    storable.get() + "\"/></todolist>";
 	std::string document = info->getTizenXmlContent();
 	if (document.empty()) {
 		MEMO_LOGE("Quick Memo is Empty");
@@ -111,8 +118,15 @@ bool MemoDbMgr::addQuickMemo(const char *text)
 	document.replace(end, strlen(MEMO_TODOLIST_END), item);
 
 	MemoCvt converter(static_cast<_MemoCvtSrcDbType>(4), document);
-	converter.addQuickMemoItem(text);
-	info->setTizenXmlContent(converter.getTizenXmlContent().c_str());
+	converter.addQuickMemoItem(storable.get());
+	// The body now holds at least the new item, so an empty document means that writing it failed:
+	// storing it would empty the quick memo.
+	const std::string written = converter.getTizenXmlContent();
+	if (written.empty()) {
+		MEMO_LOGE("Quick memo document not written; the stored memo is kept.");
+		return false;
+	}
+	info->setTizenXmlContent(written.c_str());
 	info->setAndroidXmlContent(converter.getXmlContent().c_str());
 	info->setContent(converter.getContent().c_str());
 	info->setDisplayContent(converter.getDisplayContent().c_str());

@@ -33,6 +33,15 @@ int runCommand(const std::string &cmd, std::string *out = nullptr);
 
 // Reads a whole file; empty when it cannot be read.
 std::string readFile(const std::string &path);
+
+// How often `what` occurs in `text`, overlaps included.
+inline size_t countOf(const std::string &text, const std::string &what)
+{
+	size_t n = 0;
+	for (size_t pos = text.find(what); pos != std::string::npos; pos = text.find(what, pos + 1))
+		++n;
+	return n;
+}
 } // namespace memo_test
 
 #endif

@@ -1,5 +1,6 @@
 // The converter's stored forms, the quick memo append, and its behaviour on bad input.
 #include "MemoCvt.h"
+#include "TestEnv.h"
 #include "todolist_fixture.h"
 
 #include <gtest/gtest.h>
@@ -13,14 +14,6 @@ using namespace todolist_test;
 
 namespace
 {
-size_t countOf(const std::string &text, const std::string &what)
-{
-	size_t n = 0;
-	for (size_t pos = text.find(what); pos != std::string::npos; pos = text.find(what, pos + 1))
-		++n;
-	return n;
-}
-
 // True when the document is well-formed XML.
 bool wellFormed(const std::string &xml)
 {
@@ -82,19 +75,17 @@ TEST(MemoCvtForms, EveryFormOfAMixedMemo)
 	          "<item type=\"check\" checked=\"false\">bread<br/>butter</item>\n"
 	          "<item type=\"text\" checked=\"false\">bye</item>\n</memo>\n",
 	          cvt.getXmlContent());
-}
 
-TEST(MemoCvtForms, EmptySource)
-{
-	// A root without items is an empty body too.
+	// An empty body, a root without items included, gives empty forms.
 	for (const char *source : {"", "<todolist></todolist>"}) {
-		MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, source);
-		EXPECT_EQ("", cvt.getContent() + cvt.getDisplayContent() + cvt.getStrippedContent() + cvt.getTizenXmlContent());
-		EXPECT_NE(std::string::npos, cvt.getXmlContent().find("<memo version=\"1\"/>")) << cvt.getXmlContent();
+		MemoCvt empty(MEMO_CVT_SRC_TODOLIST, source);
+		EXPECT_EQ("", empty.getContent() + empty.getDisplayContent() + empty.getStrippedContent() +
+		                  empty.getTizenXmlContent());
+		EXPECT_NE(std::string::npos, empty.getXmlContent().find("<memo version=\"1\"/>")) << empty.getXmlContent();
 	}
 }
 
-TEST(MemoCvtQuickMemo, AppendWithQuoteAngleBracketsAndBreak)
+TEST(MemoCvtQuickMemo, EachTextOnceInOrderWhateverItHolds)
 {
 	const std::string text = "say \"hi\" &amp; <b>\nnext";
 	std::string display;
@@ -107,40 +98,35 @@ TEST(MemoCvtQuickMemo, AppendWithQuoteAngleBracketsAndBreak)
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, items[0].type);
 	EXPECT_EQ("say \"hi\" &amp; &lt;b&gt;<br/>next", items[0].content);
 
-	// A second text lands behind the first, and each text is there once.
-	const std::string second = quickAppend(first, "two & \"more\"");
+	// Earlier items, check states included, survive; each text is there once, in order.
+	const std::string stored = compose({item(MEMO_BOX_ITEM_FIRST_CHECK, true, "a"), parse(first)[0]});
+	const std::string second = quickAppend(stored, "two & \"more\"");
 	items = parse(second);
-	ASSERT_EQ(2u, items.size());
-	EXPECT_EQ("two &amp; \"more\"", items[1].content);
-	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, second);
-	EXPECT_EQ(1u, countOf(cvt.getStrippedContent(), "say \"hi\""));
-	EXPECT_EQ(1u, countOf(cvt.getStrippedContent(), "two & \"more\""));
-}
-
-TEST(MemoCvtQuickMemo, StoredDocumentEdgeCases)
-{
-	// Earlier items, check states included, survive the append.
-	const std::string stored =
-	    compose({item(MEMO_BOX_ITEM_FIRST_CHECK, true, "a"), item(MEMO_BOX_ITEM_TEXT, false, "b")});
-	std::vector<MemoTodoListItem> items = parse(quickAppend(stored, "c"));
 	ASSERT_EQ(3u, items.size());
 	EXPECT_TRUE(items[0].checked);
-	EXPECT_EQ("c", items[2].content);
+	EXPECT_EQ("two &amp; \"more\"", items[2].content);
+	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, second);
+	EXPECT_EQ(1u, memo_test::countOf(cvt.getStrippedContent(), "say \"hi\""));
+	EXPECT_EQ(1u, memo_test::countOf(cvt.getStrippedContent(), "two & \"more\""));
 
 	// An empty text adds an empty item.
 	items = parse(quickAppend(stored, ""));
 	ASSERT_EQ(3u, items.size());
 	EXPECT_EQ("", items[2].content);
+	// Content behind the first root is no part of the body, and the text is there once.
+	items = parse(quickAppend(stored + "<todolist>\n</todolist>\n", "c"));
+	ASSERT_EQ(3u, items.size());
+	EXPECT_EQ("c", items[2].content);
 
 	// A source that does not end with the appended item still gets the text once, at the end.
-	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, stored);
-	cvt.addQuickMemoItem("z");
-	items = parse(cvt.getTizenXmlContent());
+	MemoCvt plain(MEMO_CVT_SRC_TODOLIST, stored);
+	plain.addQuickMemoItem("z");
+	items = parse(plain.getTizenXmlContent());
 	ASSERT_EQ(3u, items.size());
 	EXPECT_EQ("z", items[2].content);
 }
 
-TEST(MemoCvtRobustness, MalformedInputGivesValidForms)
+TEST(MemoCvtRobustness, MalformedAndHugeInputGivesValidForms)
 {
 	const std::vector<std::string> inputs = {
 	    "<todolist",
@@ -161,11 +147,8 @@ TEST(MemoCvtRobustness, MalformedInputGivesValidForms)
 		const std::string tizen = cvt.getTizenXmlContent();
 		EXPECT_TRUE(tizen.empty() || wellFormed(tizen)) << input;
 	}
-}
 
-TEST(MemoCvtRobustness, HugeItem)
-{
-	// Bigger than the editor ever stores, so made by hand.
+	// An item bigger than the editor ever stores, so made by hand.
 	const std::string big(2 * 1024 * 1024, 'w');
 	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, "<todolist><todolist_item todo_item_type=\"0\" todo_item_content=\"" + big +
 	                                       "&amp;amp;&lt;br/&gt;\"/></todolist>");

@@ -1,27 +1,28 @@
 // The quick memo row and the PIN row.
+#include "Box/MemoTodoListDocument.h"
+#include "XmlWriteFailure.h"
 #include "store_test_fixture.h"
 
 using namespace store_test;
 
 using StoreQuick = StoreTest;
 
-TEST_F(StoreQuick, AppendedTextsKeepTheirOrder)
+TEST_F(StoreQuick, AppendedTextsKeepTheirOrderAndNothingBreaksTheMemo)
 {
 	ASSERT_NE(nullptr, db());
 	db()->excuteSql("UPDATE memo SET lastModifiedAt = 1000 WHERE isQuick = 1");
 	vconf_set_int("db/memo/data-change", 0);
 
 	ASSERT_TRUE(db()->addQuickMemo("first text"));
-	ASSERT_TRUE(db()->addQuickMemo("say \"hi\" & <bye>"));
+	ASSERT_TRUE(db()->addQuickMemo("say \"hi\" & <bye>\x01"));
 	EXPECT_TRUE(db()->addQuickMemo(""));
-
-	std::string document = quickColumn("tizenXmlContent");
-	size_t first = document.find("first text");
-	size_t second = document.find("say");
-	ASSERT_NE(std::string::npos, first);
-	ASSERT_NE(std::string::npos, second);
-	EXPECT_LT(first, second);
-	EXPECT_EQ(std::string::npos, document.find("first text", first + 1)); // each once
+	// Each text once, in order; the control character is left out, so the memo reads back.
+	std::vector<MemoTodoListItem> items;
+	ASSERT_TRUE(memoParseTodoListXml(quickColumn("tizenXmlContent").c_str(), items));
+	ASSERT_EQ(3u, items.size());
+	EXPECT_EQ("first text", items[0].content);
+	EXPECT_EQ("say \"hi\" &amp; &lt;bye&gt;", items[1].content);
+	EXPECT_EQ("", items[2].content);
 	EXPECT_NE(std::string::npos, quickColumn("strippedContent").find("\"hi\""));
 	EXPECT_NE(std::string::npos, quickColumn("content").find("first text"));
 	EXPECT_NE("", quickColumn("xmlContent"));
@@ -29,30 +30,22 @@ TEST_F(StoreQuick, AppendedTextsKeepTheirOrder)
 	EXPECT_GT(atoll(quickColumn("lastModifiedAt").c_str()), 1000);
 	EXPECT_EQ(0, changeNotice()); // no change notice for quick memo text
 
+	// A failed write stores nothing: the memo stays as it was.
+	const std::string before = quickColumn("tizenXmlContent") + quickColumn("strippedContent");
+	{
+		memo_test::XmlWriteFailure failure;
+		EXPECT_FALSE(db()->addQuickMemo("lost"));
+	}
+	EXPECT_EQ(before, quickColumn("tizenXmlContent") + quickColumn("strippedContent"));
+
 	// A body without the closing root tag is replaced.
 	db()->excuteSql("UPDATE memo SET tizenXmlContent = 'old loose text' WHERE isQuick = 1");
 	ASSERT_TRUE(db()->addQuickMemo("fresh"));
-	document = quickColumn("tizenXmlContent");
-	EXPECT_EQ(std::string::npos, document.find("old loose text"));
-	EXPECT_NE(std::string::npos, document.find("fresh"));
+	EXPECT_EQ(std::string::npos, quickColumn("tizenXmlContent").find("old loose text"));
+	EXPECT_NE(std::string::npos, quickColumn("tizenXmlContent").find("fresh"));
 }
 
-TEST_F(StoreQuick, NoQuickMemoRowDropsTheText)
-{
-	vconf_set_int("db/desktop/csc/feature_92", 0);
-	ASSERT_NE(nullptr, db());
-	EXPECT_FALSE(db()->addQuickMemo("lost"));
-
-	// Removed like any memo, it is not made again.
-	vconf_unset("db/desktop/csc/feature_92");
-	MemoDbMgr::destroy();
-	unlink(dbPath().c_str());
-	ASSERT_NE(nullptr, db());
-	ASSERT_TRUE(db()->removeMemo(quickColumn("UUID").c_str()));
-	EXPECT_FALSE(db()->addQuickMemo("lost"));
-}
-
-TEST_F(StoreQuick, InitEmptiesRowOneOnly)
+TEST_F(StoreQuick, InitEmptiesRowOneOnlyAndWithoutTheRowTextIsDropped)
 {
 	ASSERT_NE(nullptr, db());
 	ASSERT_TRUE(db()->addQuickMemo("some text"));
@@ -67,12 +60,16 @@ TEST_F(StoreQuick, InitEmptiesRowOneOnly)
 	EXPECT_EQ(title, quickColumn("title"));
 	EXPECT_EQ("252;191;169;255;", quickColumn("bgColor"));
 	EXPECT_EQ("1", quickColumn("isDirty"));
+	// Removed like any memo, the row is not made again, and text for it is dropped.
+	ASSERT_TRUE(db()->removeMemo(uuid.c_str()));
+	EXPECT_FALSE(db()->addQuickMemo("lost"));
 
-	// With the feature off at first run, row one is a normal memo, and it is the one emptied.
+	// With the feature off at first run there is no quick memo: row one is a normal memo, the one emptied.
 	MemoDbMgr::destroy();
 	unlink(dbPath().c_str());
 	vconf_set_int("db/desktop/csc/feature_92", 0);
 	addMemo("normal", "precious words", 1000);
+	EXPECT_FALSE(db()->addQuickMemo("lost"));
 	ASSERT_TRUE(db()->initQuickMemo());
 	EXPECT_EQ("", query("SELECT strippedContent FROM memo WHERE _id = 1"));
 	EXPECT_EQ("normal", query("SELECT title FROM memo WHERE _id = 1"));

@@ -45,11 +45,25 @@ protected:
 		control->getSignal().addListener([this](const char *key, void *payload) {
 			keys.push_back(key);
 			payloads.push_back(payload && strcmp(key, "action,image,selected") == 0 ? static_cast<char *>(payload)
-																					  : "");
+			                                                                        : "");
 		});
 		render();
 		runFor(0.05);
 		return control;
+	}
+
+	// A control in `mode` on `record`, whose body becomes `lines` (todolist items); a second call
+	// within one test starts on a fresh window.
+	MemoBoxControl *withBody(const std::string &lines, int mode = MODE_UPDATE);
+
+	// A fresh window and control, for a second set-up within one test.
+	MemoBoxControl *remakeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
+	{
+		UiFixture::TearDown();
+		UiFixture::SetUp();
+		keys.clear();
+		payloads.clear();
+		return makeControl(doc, mode, uuid);
 	}
 
 	std::vector<MemoBoxItem *> items() const
@@ -106,6 +120,7 @@ protected:
 	}
 
 	MemoBoxControl *control = nullptr;
+	MemoDocInfo record;
 	std::vector<std::string> keys;
 	std::vector<std::string> payloads;
 };
@@ -114,12 +129,26 @@ protected:
 inline std::string todoItem(int type, bool state, const std::string &escapedContent)
 {
 	return std::string("<todolist_item todo_item_type=\"") + std::to_string(type) + "\" todo_item_state=\"" +
-		   (state ? "true" : "false") + "\" todo_item_content=\"" + escapedContent + "\"/>\n";
+	       (state ? "true" : "false") + "\" todo_item_content=\"" + escapedContent + "\"/>\n";
 }
 
 inline std::string todoList(const std::string &lines)
 {
 	return "<todolist>\n" + lines + "</todolist>\n";
+}
+
+// A picture tag with its break, escaped as todolist content.
+inline std::string escapedTag(int w, int h, const std::string &path)
+{
+	return "&lt;item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path +
+	       "&gt;&lt;/item&gt;&lt;br/&gt;";
+}
+
+inline MemoBoxControl *BoxControlFixture::withBody(const std::string &lines, int mode)
+{
+	record.setMemoUUID("box-test-memo");
+	record.setTizenXmlContent(todoList(lines).c_str());
+	return control ? remakeControl(&record, mode) : makeControl(&record, mode);
 }
 
 } // namespace memo_ui_test

@@ -1,9 +1,38 @@
-// The todolist document as the editor writes and reads it.
+// The widget-free body formats of the editor: the todolist document as the editor writes and reads it,
+// the saved markup of an item, share and pick texts, and text made fit for storing.
+#include "Box/MemoContentMarkup.h"
+#include "Box/MemoShareText.h"
+#include "Box/MemoTodoListDocument.h"
+#include "Util/MemoUtil.h"
+#include "XmlWriteFailure.h"
 #include "todolist_fixture.h"
 
+#include <Elementary.h>
 #include <gtest/gtest.h>
 
+#include <cstdlib>
+#include <string>
+
 using namespace todolist_test;
+
+namespace
+{
+std::string saved(const char *markup)
+{
+	char *out = memoSavedMarkupN(markup);
+	std::string result = out ? out : "(null)";
+	free(out);
+	return result;
+}
+
+class ShareText : public ::testing::Test
+{
+protected:
+	// The markup conversion needs Evas only; a full Elementary start is not needed.
+	static void SetUpTestSuite() { evas_init(); }
+	static void TearDownTestSuite() { evas_shutdown(); }
+};
+} // namespace
 
 TEST(TodoListWriter, LayoutAndEscaping)
 {
@@ -18,6 +47,11 @@ TEST(TodoListWriter, LayoutAndEscaping)
 	          "</todolist>\n",
 	          xml);
 	EXPECT_EQ("", compose({}));
+	// A failed write gives no document at all rather than an empty one.
+	{
+		memo_test::XmlWriteFailure failure;
+		EXPECT_EQ(nullptr, memoComposeTodoListXmlN({item(MEMO_BOX_ITEM_TEXT, false, "x")}));
+	}
 	// Empty items are skipped, a ticked one included: its tick is lost.
 	EXPECT_EQ("", compose({item(MEMO_BOX_ITEM_FIRST_CHECK, true, ""), item(MEMO_BOX_ITEM_TEXT, false, "")}));
 }
@@ -42,7 +76,7 @@ TEST(TodoListWriter, LongDocumentIsCutAndReaderKeepsItemsBeforeTheCut)
 		EXPECT_EQ(items[i].content, back[i].content) << i;
 }
 
-TEST(TodoListRoundTrip, ContentTypesAndStates)
+TEST(TodoListRoundTrip, ContentTypesStatesAndTheFirstItem)
 {
 	const std::vector<MemoTodoListItem> items = {
 	    item(MEMO_BOX_ITEM_FIRST_TEXT, false,
@@ -53,7 +87,7 @@ TEST(TodoListRoundTrip, ContentTypesAndStates)
 	    item(MEMO_BOX_ITEM_TEXT, false, "\xE2\x9C\x93 \"quoted\" 'single'"),
 	};
 	bool ok = false;
-	const std::vector<MemoTodoListItem> back = parse(compose(items), &ok);
+	std::vector<MemoTodoListItem> back = parse(compose(items), &ok);
 	EXPECT_TRUE(ok);
 	ASSERT_EQ(items.size(), back.size());
 	for (size_t i = 0; i < items.size(); ++i) {
@@ -61,26 +95,21 @@ TEST(TodoListRoundTrip, ContentTypesAndStates)
 		EXPECT_EQ(items[i].checked, back[i].checked) << i;
 		EXPECT_EQ(items[i].content, back[i].content) << i;
 	}
-}
 
-TEST(TodoListRoundTrip, FirstSurvivingItemBecomesFirst)
-{
 	// The empty head is dropped at save, so the check item behind it comes back first.
-	const std::vector<MemoTodoListItem> back =
-	    parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, ""), item(MEMO_BOX_ITEM_CHECK, true, "a"),
-	                   item(MEMO_BOX_ITEM_TEXT, false, "b")}));
+	back = parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, ""), item(MEMO_BOX_ITEM_CHECK, true, "a"),
+	                      item(MEMO_BOX_ITEM_TEXT, false, "b")}));
 	ASSERT_EQ(2u, back.size());
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, back[0].type);
 	EXPECT_TRUE(back[0].checked);
 	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, back[1].type);
 	// Items read behind existing body items are never first.
-	const std::vector<MemoTodoListItem> behind =
-	    parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, "x")}), nullptr, 1);
-	ASSERT_EQ(1u, behind.size());
-	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, behind[0].type);
+	back = parse(compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false, "x")}), nullptr, 1);
+	ASSERT_EQ(1u, back.size());
+	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, back[0].type);
 }
 
-TEST(TodoListReader, StatedSlips)
+TEST(TodoListReader, StatedSlipsAndDocumentsWithoutItems)
 {
 	const std::string xml =
 	    "<todolist>\n"
@@ -101,10 +130,8 @@ TEST(TodoListReader, StatedSlips)
 	EXPECT_EQ(MEMO_BOX_ITEM_TEXT, back[3].type);
 	EXPECT_FALSE(back[3].checked);
 	EXPECT_EQ("", back[3].content);
-}
 
-TEST(TodoListReader, RootWithoutItemsAndUnreadableDocuments)
-{
+	// A root without items gives none; an unreadable document gives one empty first item.
 	bool ok = false;
 	EXPECT_TRUE(parse("<todolist></todolist>", &ok).empty());
 	EXPECT_TRUE(ok);
@@ -116,11 +143,11 @@ TEST(TodoListReader, RootWithoutItemsAndUnreadableDocuments)
 	                  .size());
 
 	for (const char *bad : {"", "not xml", "<"}) {
-		const std::vector<MemoTodoListItem> back = parse(bad, &ok);
+		const std::vector<MemoTodoListItem> empty = parse(bad, &ok);
 		EXPECT_FALSE(ok) << bad;
-		ASSERT_EQ(1u, back.size()) << bad;
-		EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, back[0].type);
-		EXPECT_EQ("", back[0].content);
+		ASSERT_EQ(1u, empty.size()) << bad;
+		EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, empty[0].type);
+		EXPECT_EQ("", empty[0].content);
 	}
 	std::vector<MemoTodoListItem> items;
 	EXPECT_FALSE(memoParseTodoListXml(nullptr, items));
@@ -150,4 +177,74 @@ TEST(TodoListReader, ErrorAfterFirstNodeKeepsItemsSoFar)
 	EXPECT_FALSE(ok);
 	ASSERT_EQ(1u, back.size());
 	EXPECT_EQ("", back[0].content);
+}
+
+TEST(SavedMarkup, RemovesFormatTagsOnly)
+{
+	const char *kept = "a &amp; b<br/><item size=240x180 vsize=full href=file:///m/a.jpg></item><br/>"
+	                   "<font_size=20>f</font_size><b>b</b>";
+	const char *cases[][2] = {
+	    {"<color=#ff0000>red</color> bold", "red bold"},
+	    {"<align=left>left</align>", "left"},
+	    // "<u..." goes, its closing tag stays: the pass looks at the first letter only.
+	    {"<underline=on>x</underline>", "x</underline>"},
+	    {"<u>x</u>", "x</u>"},
+	    {kept, kept},
+	    // A "<" with fewer than two characters behind it ends the pass.
+	    {"abc<", "abc"},
+	    {"abc<x", "abc"},
+	    {"abc<x<color>def", "abc<xdef"},
+	    {"abc<br", "abc<br"},
+	    // An unclosed format tag runs to the end.
+	    {"abc<color=#fff", "abc"},
+	    {"", ""},
+	    {nullptr, ""},
+	};
+	for (const auto &c : cases)
+		EXPECT_EQ(c[1], saved(c[0])) << (c[0] ? c[0] : "(null)");
+}
+
+TEST_F(ShareText, EditShareListShareAndPickText)
+{
+	// Each view keeps its own table of markers.
+	const std::string display = "top\n<CHECK state=false>a</CHECK><CHECK state=true>b</CHECK>end";
+	EXPECT_EQ("top\n[  ]a\n[v]b\nend", memoApplyEditShareMarkers(display));
+	EXPECT_EQ("top\n[ ]a\n[V]b\nend", memoApplyListShareMarkers(display));
+	EXPECT_EQ("<CHECK state=maybe>", memoApplyListShareMarkers("<CHECK state=maybe>"));
+
+	const std::string doc =
+	    compose({item(MEMO_BOX_ITEM_FIRST_TEXT, false,
+	                  "Fish &amp; chips&lt;3<br/><item size=240x180 vsize=full href=file:///m/a.jpg></item><br/>x"),
+	             item(MEMO_BOX_ITEM_CHECK, true, "milk"), item(MEMO_BOX_ITEM_CHECK, false, "eggs")});
+	const std::string text = memoComposeEditShareText("Title", doc.c_str(), "ignored");
+	EXPECT_EQ("Title\nFish & chips\xEF\xBC\x9C"
+	          "3\n\nx\n[v]milk\n[  ]eggs\n",
+	          text);
+
+	// Without a document the display content is shared, cut like a document.
+	EXPECT_EQ("[  ]ab\n", memoComposeEditShareText("", "",
+	                                               "<CHECK state=false>a\xC2\xA0"
+	                                               "b</CHECK>"));
+	EXPECT_EQ("T\n", memoComposeEditShareText("T", nullptr, nullptr));
+	EXPECT_EQ("", memoComposeEditShareText(nullptr, nullptr, nullptr));
+	const std::string longText(50000, 'a');
+	EXPECT_EQ(40959u, memoComposeEditShareText(nullptr, nullptr, longText.c_str()).size());
+
+	// A pick gives the title, and the display text only with a document.
+	EXPECT_EQ("T\n[V]a\n[ ]b\n",
+	          memoComposePickText("T", "<todolist>...", "<CHECK state=true>a</CHECK><CHECK state=false>b</CHECK>"));
+	// A memo without a document contributes only its title.
+	EXPECT_EQ("T\n", memoComposePickText("T", "", "stale"));
+	EXPECT_EQ("body", memoComposePickText("", "<todolist>", "body"));
+	EXPECT_EQ("", memoComposePickText(nullptr, nullptr, nullptr));
+}
+
+TEST(StorableText, ControlCharactersGoAndLineEndsStay)
+{
+	// What a share or another application hands in: the text must fit a stored document.
+	char *text = MemoUtil::stripControlCharsN("a\x01"
+	                                          "b\tc\r\nd\re\x7f\xEF\xBF\xBF\xC3\xA9\xFF\x1b");
+	EXPECT_STREQ("ab\tc\nd\ne\x7f\xC3\xA9", text);
+	free(text);
+	EXPECT_EQ(nullptr, MemoUtil::stripControlCharsN(nullptr));
 }

@@ -1,0 +1,241 @@
+// The entry filter on a real entry: foreign tags, breaks, the budget, tag repair, forbidden sources and
+// the image count; then tags fitted to this display, files taken into the memo's folder, and large
+// pictures shrunk on workers while the insertion waits.
+#include <gtest/gtest.h>
+
+#include <Ecore_File.h>
+#include <app_i18n.h>
+
+#include <cstdio>
+
+#include "TestEnv.h"
+#include "Util/MemoUtil.h"
+#include "support/FakeBoxOwner.h"
+#include "support/UiTestSupport.h"
+
+using namespace memo_ui_test;
+
+namespace
+{
+class EntryFilterTest : public UiFixture
+{
+protected:
+	void SetUp() override
+	{
+		UiFixture::SetUp();
+		owner = new FakeBoxOwner(box, "filter-memo");
+		item = owner->addItem(MEMO_BOX_ITEM_TEXT);
+		folder = std::string(MemoUtil::getDataPath()) + "media/filter-memo/";
+		elsewhere = std::string(MemoUtil::getDataPath()) + "media/other-memo/";
+		ecore_file_mkpath(elsewhere.c_str());
+		// This display's size for a tag of a missing file, so that the expected texts match it.
+		sscanf(insert("<item size=1x1 vsize=full href=file:///nowhere/p.png></item>").c_str(), "<item size=%dx%d",
+		       &width, &height);
+		insert("");
+		owner->calls.clear();
+		clearToasts();
+	}
+	void TearDown() override
+	{
+		delete owner;
+		UiFixture::TearDown();
+	}
+
+	std::string text() const
+	{
+		const char *t = elm_entry_entry_get(item->getEntry());
+		return t ? t : "";
+	}
+	// The entry's text after `markup` was inserted into the emptied entry.
+	std::string insert(const std::string &markup)
+	{
+		elm_entry_entry_set(item->getEntry(), "");
+		item->insertText(markup.c_str());
+		return text();
+	}
+
+	// A tag whose file does not exist, so that no copy or size work gets in the way of the counting.
+	std::string ghostTag(int i) const
+	{
+		return ghostOpen(("file:///nowhere/" + std::to_string(i) + ".png").c_str()) + "></item>";
+	}
+	std::string ghostOpen(const char *href) const
+	{
+		return "<item size=" + std::to_string(width) + "x" + std::to_string(height) + " vsize=full href=" + href;
+	}
+	// The tag this display gives a picture of pictureW x pictureH at `path`.
+	std::string fittedTag(const std::string &path, int pictureW, int pictureH) const
+	{
+		return "<item size=" + std::to_string(width) + "x" + std::to_string(pictureH * width / pictureW + 40) +
+		       " vsize=full href=file://" + path + "></item>";
+	}
+	static std::string pathOf(const std::string &markup)
+	{
+		const size_t at = markup.find("href=file://");
+		if (at == std::string::npos)
+			return "";
+		const size_t start = at + strlen("href=file://");
+		return markup.substr(start, markup.find('>', start) - start);
+	}
+	bool pictureSize(const std::string &path, int *w, int *h)
+	{
+		Evas_Object *img = evas_object_image_add(evas());
+		evas_object_image_file_set(img, path.c_str(), nullptr);
+		evas_object_image_size_get(img, w, h);
+		const bool ok = evas_object_image_load_error_get(img) == EVAS_LOAD_ERROR_NONE;
+		evas_object_del(img);
+		return ok;
+	}
+
+	FakeBoxOwner *owner = nullptr;
+	MemoBoxItem *item = nullptr;
+	std::string folder, elsewhere;
+	int width = 0, height = 0;
+};
+} // namespace
+
+TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharacters)
+{
+	EXPECT_EQ("one<br/>two<br/>three", insert("one\ntwo\nthree"));
+	EXPECT_EQ("big red<br/>left", insert("<font_size=40>big</font_size> <color=#ff0000>red</color><br/>"
+	                                     "<align=left>left</align>"));
+	EXPECT_EQ("linked", insert("<link>linked</link>"));
+	EXPECT_EQ("plain", insert("<+ font=Sans>plain</>"));
+	// Tags the filter does not know stay for the entry to judge.
+	EXPECT_EQ("x<tab/>y", insert("x<tab/>y"));
+	EXPECT_EQ("abcde", insert("a\xC2\xA0"
+	                          "b&nbsp;c&#160;d&#xa0;e"));
+	EXPECT_EQ("ab<br/>c", insert("a\x01"
+	                             "b\r\nc\x1b"));
+}
+
+TEST_F(EntryFilterTest, ReturnAfterAPictureKeepsItInPlace)
+{
+	// The split of a line puts pictures back where no-break spaces stand; a pasted one must not be there.
+	MemoBoxItem *check = owner->addItem(MEMO_BOX_ITEM_CHECK);
+	check->insertText(("a&nbsp;b" + ghostTag(1)).c_str());
+	const std::string line = elm_entry_entry_get(check->getEntry());
+	focus(check->getEntry());
+	elm_entry_cursor_end_set(check->getEntry());
+	pressKey("Return", "\r");
+	runFor(0.05);
+	EXPECT_EQ(line, elm_entry_entry_get(check->getEntry()));
+	EXPECT_EQ(0u, line.find("ab<item size="));
+	EXPECT_EQ(1, owner->count("add:1:"));
+}
+
+TEST_F(EntryFilterTest, NoBudgetNothingEntersAndTypingCountsNoImages)
+{
+	focus(item->getEntry());
+	typeText("kept");
+	item->setLimit(0);
+	item->insertText("more");
+	EXPECT_EQ("kept", text());
+	ASSERT_EQ(1, toastCount());
+	EXPECT_EQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), toastAt(0));
+	EXPECT_EQ(0, owner->count("count"));
+}
+
+TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
+{
+	ASSERT_GT(width, 1);
+	const std::string base = ghostOpen("file:///nowhere/a.png");
+	EXPECT_EQ(base + "></item>x", insert(base + ">x"));
+	EXPECT_EQ(base + "></item>x", insert(base + "></item></item>x"));
+	EXPECT_EQ(base + "></item>xy", insert(base + "></item>x</item>y</item>"));
+	EXPECT_EQ("ab", insert("a<item size=10x10 vsize=full></item>b"));
+
+	const std::string web = ghostOpen("http://example.org/a.png") + "></item>";
+	const std::string data = ghostOpen("data:image/png;base64,AAAA") + "></item>";
+	const std::string good = ghostTag(1);
+	EXPECT_EQ("a" + good + "b", insert("a" + web + data + good + "b"));
+	// Behind a good tag the walk has stopped: this one survives the step.
+	EXPECT_EQ(good + web, insert(good + web));
+}
+
+TEST_F(EntryFilterTest, ImageCountLimits)
+{
+	std::string twelve;
+	for (int i = 0; i < 12; i++)
+		twelve += ghostTag(i);
+	char limitToast[256];
+	snprintf(limitToast, sizeof(limitToast), i18n_get_text("IDS_MEMO_TPOP_CANT_INSERT_MORE_THAN_PD_IMAGES"), 10);
+	// A memo with no images takes eleven, one toast for the rest.
+	owner->imageCount = -1;
+	const std::string kept = insert(twelve);
+	EXPECT_EQ(11u, memo_test::countOf(kept, "<item"));
+	EXPECT_NE(std::string::npos, kept.find("/nowhere/10.png"));
+	EXPECT_EQ(std::string::npos, kept.find("/nowhere/11.png"));
+	ASSERT_EQ(1, toastCount());
+	EXPECT_EQ(limitToast, toastAt(0));
+	// A memo with one stops at ten in all.
+	owner->imageCount = 1;
+	EXPECT_EQ(9u, memo_test::countOf(insert(twelve), "<item"));
+	EXPECT_EQ(2, toastCount());
+	// A full memo takes none, with a toast for each refusal.
+	owner->imageCount = 10;
+	EXPECT_EQ("ab", insert("a" + ghostTag(1) + ghostTag(2) + "b"));
+	EXPECT_EQ(4, toastCount());
+}
+
+TEST_F(EntryFilterTest, SizedTagsAreFittedAndTakenIntoTheMemo)
+{
+	const std::string source = elsewhere + "photo.png";
+	ASSERT_TRUE(writePicture(source, 200, 100));
+	const std::string path = pathOf(insert(fittedTag(source, 200, 100)));
+	ASSERT_EQ(0u, path.find(folder)) << text();
+	EXPECT_TRUE(eina_str_has_extension(path.c_str(), ".png"));
+	EXPECT_TRUE(ecore_file_exists(path.c_str()));
+	EXPECT_TRUE(ecore_file_exists(source.c_str()));
+	EXPECT_EQ(0, owner->count("popup:"));
+	// A tag already at home keeps its file; a width of another display is fitted to this one.
+	EXPECT_EQ(fittedTag(path, 200, 100), insert("<item size=100x90 vsize=full href=file://" + path + "></item>"));
+}
+
+TEST_F(EntryFilterTest, APasteOfTheFixedSizeIsRebuiltWhenItsFileExists)
+{
+	const std::string source = elsewhere + "pasted.jpg";
+	ASSERT_TRUE(writePicture(source, 300, 200));
+	const std::string path = pathOf(insert("a<item absize=240x180 href=file://" + source + "></item>b"));
+	ASSERT_EQ(0u, path.find(folder)) << text();
+	EXPECT_TRUE(eina_str_has_extension(path.c_str(), ".jpg"));
+	EXPECT_EQ("a" + fittedTag(path, 300, 200) + "b", text());
+	const std::string gone = "<item absize=240x180 href=file:///nowhere/gone.jpg></item>";
+	EXPECT_EQ(gone, insert(gone));
+}
+
+TEST_F(EntryFilterTest, LargePicturesAreShrunkOnWorkers)
+{
+	// A sized tag from elsewhere enters at once; its worker shrinks the copy behind the scenes (a PNG:
+	// shrunk without the canvas).
+	const std::string big = elsewhere + "big.png";
+	ASSERT_TRUE(writePicture(big, 1000, 800));
+	const std::string copy = pathOf(insert(fittedTag(big, 1000, 800)));
+	ASSERT_EQ(0u, copy.find(folder)) << text();
+	EXPECT_EQ(0, owner->count("popup:"));
+	int w = 0, h = 0;
+	ASSERT_TRUE(waitFor([&] { return pictureSize(copy, &w, &h) && w * h <= 320000; }, 20.0));
+
+	// Text with a pasted large picture waits for its worker; the popup covers the wait.
+	const std::string source = elsewhere + "large.jpg";
+	ASSERT_TRUE(writePicture(source, 1200, 900));
+	EXPECT_EQ("", insert("hello<item absize=240x180 href=file://" + source + "></item>"));
+	ASSERT_EQ(1, owner->count("popup:1"));
+	EXPECT_EQ(0, owner->count("popup:0"));
+	ASSERT_TRUE(waitFor([&] { return !text().empty(); }, 20.0));
+	EXPECT_EQ(0u, text().find("hello<item size="));
+	EXPECT_EQ(1, owner->count("popup:0"));
+	// The picture in the memo's folder has been shrunk below the insertion limit; the original is untouched.
+	ASSERT_TRUE(pictureSize(pathOf(text()), &w, &h));
+	EXPECT_LE(w * h, 320000);
+	ASSERT_TRUE(pictureSize(source, &w, &h));
+	EXPECT_EQ(1200, w);
+
+	// An item deleted during the wait is left alone.
+	insert("x<item absize=240x180 href=file://" + source + "></item>");
+	ASSERT_EQ(2, owner->count("popup:1"));
+	owner->removeItem(item);
+	item = nullptr;
+	runFor(2.0);
+	EXPECT_EQ(1, owner->count("popup:0"));
+}
