@@ -15,9 +15,10 @@ namespace memo_test
 {
 const std::string &tempRoot()
 {
+	// In memory where possible: SQLite and the key stores sync every write, which costs a disk seconds.
 	static const std::string root = [] {
-		char tmpl[] = "/tmp/memo-test-XXXXXX";
-		return std::string(mkdtemp(tmpl) ? tmpl : "");
+		char shm[] = "/dev/shm/memo-test-XXXXXX", tmp[] = "/tmp/memo-test-XXXXXX";
+		return std::string(mkdtemp(shm) ? shm : mkdtemp(tmp) ? tmp : "");
 	}();
 	return root;
 }
