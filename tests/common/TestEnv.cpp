@@ -49,10 +49,15 @@ void pumpFor(double seconds)
 	pump(seconds, [] { return false; });
 }
 
-Evas_Object *addShownWindow(const char *name)
+void initElementary()
 {
 	static int ready = elm_init(0, nullptr);
 	(void)ready;
+}
+
+Evas_Object *addShownWindow(const char *name)
+{
+	initElementary();
 	Evas_Object *win = elm_win_add(nullptr, name, ELM_WIN_BASIC);
 	evas_object_resize(win, 480, 800);
 	evas_object_show(win);

@@ -22,7 +22,10 @@ bool pump(double timeoutSec, const std::function<bool()> &pred);
 // Iterates the main loop for the given time.
 void pumpFor(double seconds);
 
-// Elementary up (once per process) and a shown 480 x 800 window, returned after its first frame, when its
+// Elementary up, once per process.
+void initElementary();
+
+// Elementary up and a shown 480 x 800 window, returned after its first frame, when its
 // content is visible and takes keys.
 Evas_Object *addShownWindow(const char *name);
 
