@@ -61,12 +61,18 @@ Evas_Object *addShownWindow(const char *name)
 	Evas_Object *win = elm_win_add(nullptr, name, ELM_WIN_BASIC);
 	evas_object_resize(win, 480, 800);
 	evas_object_show(win);
+	waitForFrame(win);
+	return win;
+}
+
+bool waitForFrame(Evas_Object *win)
+{
 	bool rendered = false;
 	Evas_Event_Cb renderedCb = [](void *data, Evas *, void *) { *static_cast<bool *>(data) = true; };
 	evas_event_callback_add(evas_object_evas_get(win), EVAS_CALLBACK_RENDER_POST, renderedCb, &rendered);
 	pump(5.0, [&] { return rendered; });
 	evas_event_callback_del_full(evas_object_evas_get(win), EVAS_CALLBACK_RENDER_POST, renderedCb, &rendered);
-	return win;
+	return rendered;
 }
 
 std::string helperPath(const std::string &name)

@@ -25,9 +25,11 @@ void pumpFor(double seconds);
 // Elementary up, once per process.
 void initElementary();
 
-// Elementary up and a shown 480 x 800 window, returned after its first frame, when its
-// content is visible and takes keys.
+// Elementary up and a shown 480 x 800 window, returned after its first frame.
 Evas_Object *addShownWindow(const char *name);
+
+// Waits for the next frame of a shown window: after the first one its content is visible and takes keys.
+bool waitForFrame(Evas_Object *win);
 
 // Path of a helper process built from tests/helpers/<name>.c(pp).
 std::string helperPath(const std::string &name);
