@@ -25,39 +25,27 @@ protected:
 	Evas_Object *win = nullptr;
 };
 
-TEST_F(UxtWidgets, EditFieldKindsConfigureTheEntry)
+TEST_F(UxtWidgets, EditFieldKindsConfigureTheEntryAndTheClearButtonEmptiesIt)
 {
 	Evas_Object *title = uxt_edit_field_add(win, UXT_EDIT_FIELD_SCROLL_SINGLELINE);
-	ASSERT_NE(nullptr, title);
+	Evas_Object *password = uxt_edit_field_add(win, UXT_EDIT_FIELD_SCROLL_SINGLELINE_PASSWORD);
+	Evas_Object *search = uxt_edit_field_add(win, UXT_EDIT_FIELD_SEARCHBAR);
+	Evas_Object *body = uxt_edit_field_add(win, UXT_EDIT_FIELD_MULTILINE);
+	ASSERT_TRUE(title && password && search && body);
 	EXPECT_TRUE(elm_entry_single_line_get(title));
 	EXPECT_TRUE(elm_entry_scrollable_get(title));
 	EXPECT_FALSE(elm_entry_password_get(title));
-
-	Evas_Object *password = uxt_edit_field_add(win, UXT_EDIT_FIELD_SCROLL_SINGLELINE_PASSWORD);
-	ASSERT_NE(nullptr, password);
 	EXPECT_TRUE(elm_entry_password_get(password));
-
-	Evas_Object *search = uxt_edit_field_add(win, UXT_EDIT_FIELD_SEARCHBAR);
-	ASSERT_NE(nullptr, search);
 	EXPECT_EQ(ELM_INPUT_PANEL_RETURN_KEY_TYPE_SEARCH, elm_entry_input_panel_return_key_type_get(search));
-
-	Evas_Object *body = uxt_edit_field_add(win, UXT_EDIT_FIELD_MULTILINE);
-	ASSERT_NE(nullptr, body);
 	EXPECT_FALSE(elm_entry_single_line_get(body));
 	EXPECT_EQ(nullptr, clearButton(body));
 	EXPECT_EQ(nullptr, uxt_edit_field_add(win, UXT_EDIT_FIELD_LAST));
-}
 
-TEST_F(UxtWidgets, ClearButtonEmptiesTheField)
-{
-	Evas_Object *field = uxt_edit_field_add(win, UXT_EDIT_FIELD_SEARCHBAR);
-	ASSERT_NE(nullptr, field);
-	Evas_Object *button = clearButton(field);
-	ASSERT_NE(nullptr, button);
-	elm_entry_entry_set(field, "memo");
-	ASSERT_STREQ("memo", elm_entry_entry_get(field));
-	evas_object_smart_callback_call(button, "clicked", nullptr);
-	EXPECT_TRUE(elm_entry_is_empty(field));
+	ASSERT_NE(nullptr, clearButton(search));
+	elm_entry_entry_set(search, "memo");
+	ASSERT_STREQ("memo", elm_entry_entry_get(search));
+	evas_object_smart_callback_call(clearButton(search), "clicked", nullptr);
+	EXPECT_TRUE(elm_entry_is_empty(search));
 }
 
 TEST_F(UxtWidgets, EntryAndScrollerSwitches)
