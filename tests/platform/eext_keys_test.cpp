@@ -12,7 +12,7 @@ namespace
 {
 using Hits = std::vector<std::string>;
 
-// Who heard which key: "<name>/<callback type>".
+// Who heard which key: the name for back, "<name>+more" for more.
 struct Tag {
 	Hits *hits;
 	const char *name;
@@ -21,7 +21,10 @@ struct Tag {
 void recordCb(void *data, Evas_Object *, void *event_info)
 {
 	auto *tag = static_cast<Tag *>(data);
-	tag->hits->push_back(std::string(tag->name) + "/" + std::to_string(reinterpret_cast<intptr_t>(event_info)));
+	intptr_t type = reinterpret_cast<intptr_t>(event_info);
+	tag->hits->push_back(tag->name + std::string(type == EEXT_CALLBACK_BACK   ? ""
+	                                             : type == EEXT_CALLBACK_MORE ? "+more"
+	                                                                          : "+?"));
 }
 
 void deleteSelfCb(void *data, Evas_Object *obj, void *event_info)
@@ -79,8 +82,6 @@ protected:
 	Tag nfTag{&hits, "naviframe"};
 };
 
-const std::string kBack = "/" + std::to_string(EEXT_CALLBACK_BACK), kMore = "/" + std::to_string(EEXT_CALLBACK_MORE);
-
 TEST_F(EextKeys, BackAndMoreKeysReachTheTopmostHandlerOnRelease)
 {
 	eext_object_event_callback_add(nf, EEXT_CALLBACK_BACK, recordCb, &nfTag);
@@ -91,7 +92,7 @@ TEST_F(EextKeys, BackAndMoreKeysReachTheTopmostHandlerOnRelease)
 
 	press("Escape");
 	press("Return");
-	EXPECT_EQ(Hits{"popup" + kBack}, hits);
+	EXPECT_EQ(Hits{"popup"}, hits);
 	evas_object_hide(popup);
 	press("XF86Back");
 	// Only key release counts.
@@ -100,9 +101,7 @@ TEST_F(EextKeys, BackAndMoreKeysReachTheTopmostHandlerOnRelease)
 	evas_event_feed_key_up(evas, "XF86Stop", "XF86Stop", "", nullptr, 0, nullptr);
 	for (const char *key : {"Menu", "F2", "XF86Menu"})
 		press(key);
-	EXPECT_EQ((Hits{"popup" + kBack, "naviframe" + kBack, "naviframe" + kBack, "naviframe" + kMore, "naviframe" + kMore,
-	                "naviframe" + kMore}),
-	          hits);
+	EXPECT_EQ((Hits{"popup", "naviframe", "naviframe", "naviframe+more", "naviframe+more", "naviframe+more"}), hits);
 
 	EXPECT_EQ(&nfTag, eext_object_event_callback_del(nf, EEXT_CALLBACK_MORE, recordCb));
 	press("Menu");
@@ -122,7 +121,7 @@ TEST_F(EextKeys, HigherLayerThenDeepestObjectWins)
 	eext_object_event_callback_add(low, EEXT_CALLBACK_BACK, recordCb, &lowTag);
 	eext_object_event_callback_add(high, EEXT_CALLBACK_BACK, unregisterSelfCb, &highTag);
 	press("Escape");
-	EXPECT_EQ(Hits{"high" + kBack}, hits);
+	EXPECT_EQ(Hits{"high"}, hits);
 	evas_object_del(low);
 
 	// A view registers on its layout; a field inside it takes the key first while it holds a handler.
@@ -137,7 +136,7 @@ TEST_F(EextKeys, HigherLayerThenDeepestObjectWins)
 	eext_object_event_callback_add(entry, EEXT_CALLBACK_BACK, unregisterSelfCb, &entryTag);
 	press("Escape");
 	press("Escape");
-	EXPECT_EQ((Hits{"high" + kBack, "entry" + kBack, "layout" + kBack}), hits);
+	EXPECT_EQ((Hits{"high", "entry", "layout"}), hits);
 }
 
 TEST_F(EextKeys, DeletingTheObjectInsideItsCallbackIsSafe)
@@ -151,7 +150,7 @@ TEST_F(EextKeys, DeletingTheObjectInsideItsCallbackIsSafe)
 	press("Escape");
 	EXPECT_EQ(nullptr, popup);
 	press("Escape");
-	EXPECT_EQ((Hits{"first" + kBack, "naviframe" + kBack}), hits);
+	EXPECT_EQ((Hits{"first", "naviframe"}), hits);
 }
 
 TEST_F(EextKeys, StockHandlersPopAndDelete)
@@ -190,7 +189,7 @@ TEST_F(EextKeys, ToolkitBindingsNeverSeeTheKeys)
 	eext_object_event_callback_add(nf, EEXT_CALLBACK_BACK, recordCb, &nfTag);
 
 	press("Escape");
-	EXPECT_EQ(Hits{"naviframe" + kBack}, hits);
+	EXPECT_EQ(Hits{"naviframe"}, hits);
 	EXPECT_NE(elm_naviframe_bottom_item_get(nf), elm_naviframe_top_item_get(nf));
 }
 
