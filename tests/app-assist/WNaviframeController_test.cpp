@@ -13,34 +13,30 @@ namespace
 
 using NaviframeTest = aa_test::UiTest;
 
-TEST_F(NaviframeTest, PushCallsCreateHooksThenOnPushedWithTheParam)
+const Log kPushed = {"constructor", "onCreateView", "onCreated", "onPushed"};
+
+TEST_F(NaviframeTest, PushCallsCreateHooksThenOnPushedAndAFailedCreateLeavesTheStack)
 {
 	int param = 3;
 	LoggingPage *page = new LoggingPage("A", &log);
 	ASSERT_TRUE(naviframe->push(page, "PageA", &param));
-	EXPECT_EQ(entriesOf("A"), (Log{"constructor", "onCreateView", "onCreated", "onPushed"}));
+	EXPECT_EQ(entriesOf("A"), kPushed);
 	EXPECT_EQ(page->receivedParam, &param);
 	EXPECT_STREQ(page->getName(), "PageA");
 	EXPECT_EQ(page->getNaviframeController(), naviframe);
 	EXPECT_NE(page->getNaviItem(), nullptr);
 	EXPECT_TRUE(naviframe->isTopContentViewController(page));
-	EXPECT_EQ(naviframe->getContentViewCount(), 1);
-}
 
-TEST_F(NaviframeTest, FailedCreateLeavesTheStackAsItWas)
-{
-	LoggingPage *bottom = pushPage("A");
 	EXPECT_FALSE(naviframe->push(new LoggingPage("B", &log, true)));
 	EXPECT_EQ(entriesOf("B"), (Log{"constructor", "onCreateView", "destructor"}));
 	EXPECT_EQ(naviframe->getContentViewCount(), 1);
-	EXPECT_EQ(naviframe->getTopContentViewController(), bottom);
+	EXPECT_EQ(naviframe->getTopContentViewController(), page);
 }
 
 TEST_F(NaviframeTest, PoppingThePageAboveMakesTheLowerOneTopAgain)
 {
 	LoggingPage *a = pushPage("A");
-	LoggingPage *b = pushPage("B");
-	EXPECT_EQ(naviframe->getTopContentViewController(), b);
+	pushPage("B");
 	pressKey("Escape");
 	ASSERT_TRUE(waitFor([&] { return hasEntry("B:destructor") && hasEntry("A:onBecomeTop"); }));
 	EXPECT_EQ(entriesOf("B"),
@@ -48,13 +44,22 @@ TEST_F(NaviframeTest, PoppingThePageAboveMakesTheLowerOneTopAgain)
 	EXPECT_EQ(entriesOf("A"), (Log{"constructor", "onCreateView", "onCreated", "onPushed", "onBecomeTop"}));
 	EXPECT_EQ(naviframe->getTopContentViewController(), a);
 
-	// A second round: a page pushed and popped again brings A back on top once more.
-	pushPage("C");
-	naviframe->getTopContentViewController()->popOut();
-	ASSERT_TRUE(waitFor([&] { return hasEntry("C:destructor"); }));
-	runFor(0.05);
-	Log aEntries = entriesOf("A");
-	EXPECT_EQ(std::count(aEntries.begin(), aEntries.end(), "onBecomeTop"), 2);
+	// A second round, by popOut and by destroying the page: A comes back on top each time.
+	for (int round = 2; round <= 3; ++round) {
+		LoggingPage *c = pushPage("C");
+		if (round == 2) {
+			c->popOut();
+		} else {
+			c->destroy();
+			EXPECT_EQ(log.back(), "C:destructor");
+		}
+		ASSERT_TRUE(waitFor([&] {
+			Log aEntries = entriesOf("A");
+			return std::count(aEntries.begin(), aEntries.end(), "onBecomeTop") == round;
+		}));
+		EXPECT_EQ(naviframe->getTopContentViewController(), a);
+		EXPECT_EQ(naviframe->getContentViewCount(), 1);
+	}
 }
 
 TEST_F(NaviframeTest, PopOutOfAPageBelowTheTopRemovesOnlyIt)
@@ -64,24 +69,13 @@ TEST_F(NaviframeTest, PopOutOfAPageBelowTheTopRemovesOnlyIt)
 	LoggingPage *c = pushPage("C");
 	b->popOut();
 	ASSERT_TRUE(waitFor([&] { return hasEntry("B:destructor"); }));
-	runFor(0.05);
+	settle();
 	EXPECT_EQ(naviframe->getTopContentViewController(), c);
 	EXPECT_EQ(naviframe->getContentViewCount(), 2);
 	EXPECT_FALSE(hasEntry("C:onBecomeTop"));
 	EXPECT_FALSE(hasEntry("A:onBecomeTop"));
 	Log bEntries = entriesOf("B");
 	EXPECT_EQ(Log(bEntries.end() - 3, bEntries.end()), (Log{"onPop", "onDestroy", "destructor"}));
-}
-
-TEST_F(NaviframeTest, DestroyingAPageObjectTakesItsItemAlong)
-{
-	LoggingPage *a = pushPage("A");
-	pushPage("B");
-	naviframe->getTopContentViewController()->destroy();
-	EXPECT_EQ(entriesOf("B").back(), "destructor");
-	ASSERT_TRUE(waitFor([&] { return hasEntry("A:onBecomeTop"); }));
-	EXPECT_EQ(naviframe->getTopContentViewController(), a);
-	EXPECT_EQ(naviframe->getContentViewCount(), 1);
 }
 
 TEST_F(NaviframeTest, LastPageHookDecidesWhetherThePopGoesOn)
@@ -99,8 +93,8 @@ TEST_F(NaviframeTest, LastPageHookDecidesWhetherThePopGoesOn)
 	EXPECT_EQ(hookCalls, 0);
 
 	pressKey("Escape");
-	runFor(0.3);
-	EXPECT_EQ(hookCalls, 1);
+	ASSERT_TRUE(waitFor([&] { return hookCalls == 1; }));
+	settle();
 	EXPECT_EQ(naviframe->getTopContentViewController(), a);
 	EXPECT_FALSE(hasEntry("A:onPop"));
 
@@ -115,9 +109,15 @@ TEST_F(NaviframeTest, LastPageHookDecidesWhetherThePopGoesOn)
 	EXPECT_EQ(naviframe->getContentViewCount(), 0);
 }
 
-TEST_F(NaviframeTest, WindowTeardownEndsEveryPage)
+TEST_F(NaviframeTest, WindowTeardownEndsEveryPageAndMoreReachesTheTop)
 {
-	pushPage("A");
+	LoggingPage *a = pushPage("A");
+	int moreCalls = 0;
+	a->setMoreButton(
+	    a->getNaviItem(), [](void *data, Evas_Object *, void *) { ++*static_cast<int *>(data); }, &moreCalls);
+	pressKey("Menu");
+	EXPECT_EQ(moreCalls, 1);
+
 	pushPage("B");
 	delete window;
 	window = nullptr;
@@ -126,17 +126,6 @@ TEST_F(NaviframeTest, WindowTeardownEndsEveryPage)
 		ASSERT_GE(entries.size(), 3u);
 		EXPECT_EQ(Log(entries.end() - 3, entries.end()), (Log{"onPop", "onDestroy", "destructor"})) << tag;
 	}
-}
-
-TEST_F(NaviframeTest, MoreKeyReachesTheTopPage)
-{
-	LoggingPage *a = pushPage("A");
-	int moreCalls = 0;
-	a->setMoreButton(
-	    a->getNaviItem(), [](void *data, Evas_Object *, void *) { ++*static_cast<int *>(data); }, &moreCalls);
-	pressKey("Menu");
-	EXPECT_EQ(moreCalls, 1);
-	EXPECT_EQ(naviframe->getTopContentViewController(), a);
 }
 
 } // namespace

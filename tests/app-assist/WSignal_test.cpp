@@ -8,6 +8,7 @@
 
 using app_assist::WSignal;
 using Signal = WSignal<void(const char *, void *)>;
+using Heard = std::vector<std::string>;
 
 namespace
 {
@@ -16,128 +17,96 @@ class WSignalTest : public aa_test::UiTest
 {
 protected:
 	Evas_Object *makeOwner() { return evas_object_rectangle_add(evas_object_evas_get(window->getEvasObj())); }
-	std::vector<std::string> heard;
+	// A listener that notes its name and the key.
+	Signal::Listener note(const char *name)
+	{
+		return [this, name](const char *key, void *) { heard.push_back(std::string(name) + ":" + key); };
+	}
+	Heard heard;
 };
 
-TEST_F(WSignalTest, DeliversInRegistrationOrderWithArguments)
+TEST_F(WSignalTest, DeliversInRegistrationOrderAndAnEmptyFunctionThrows)
 {
 	Signal signal;
 	int payload = 7;
+	signal.addListener([&](const char *, void *data) { EXPECT_EQ(data, &payload); });
 	for (const char *name : {"a", "b", "c"})
-		signal.addListener([this, name, &payload](const char *key, void *data) {
-			heard.push_back(std::string(name) + ":" + key);
-			EXPECT_EQ(data, &payload);
-		});
+		signal.addListener(note(name));
 	signal.emit("k", &payload);
-	EXPECT_EQ(heard, (std::vector<std::string>{"a:k", "b:k", "c:k"}));
+	EXPECT_EQ(heard, (Heard{"a:k", "b:k", "c:k"}));
+
+	unsigned int emptyId = signal.addListener(Signal::Listener());
+	EXPECT_THROW(signal.emit("k", &payload), std::bad_function_call);
+	signal.removeListener(emptyId);
+	heard.clear();
+	signal.emit("again", &payload);
+	EXPECT_EQ(heard, (Heard{"a:again", "b:again", "c:again"}));
 }
 
-// A listener removed during an emission, itself or one still to come, is not called again.
-TEST_F(WSignalTest, RemovalDuringEmission)
+// A listener removed during an emission, itself or one still to come, is not called again; one added
+// hears only later emissions; a listener may delete the signal.
+TEST_F(WSignalTest, ChangesDuringAnEmission)
 {
 	Signal signal;
 	unsigned int selfId = 0, laterId = 0;
-	selfId = signal.addListener([&](const char *, void *) {
-		heard.push_back("self");
+	selfId = signal.addListener([&](const char *key, void *) {
+		note("self")(key, nullptr);
 		signal.removeListener(selfId);
 		signal.removeListener(laterId);
+		signal.addListener(note("new"));
 	});
-	signal.addListener([&](const char *, void *) { heard.push_back("other"); });
-	laterId = signal.addListener([&](const char *, void *) { heard.push_back("later"); });
-	signal.emit("k", nullptr);
-	signal.emit("k", nullptr);
-	EXPECT_EQ(heard, (std::vector<std::string>{"self", "other", "other"}));
-	EXPECT_EQ(signal.getListenerCount(), 1u);
-	signal.removeListener(selfId); // logs, changes nothing
-	EXPECT_EQ(signal.getListenerCount(), 1u);
-}
-
-TEST_F(WSignalTest, ListenerAddedDuringEmissionHearsOnlyLaterOnes)
-{
-	Signal signal;
-	bool added = false;
-	signal.addListener([&](const char *key, void *) {
-		heard.push_back(std::string("first:") + key);
-		if (!added) {
-			added = true;
-			signal.addListener([&](const char *k, void *) { heard.push_back(std::string("new:") + k); });
-		}
-	});
-	signal.addListener([&](const char *key, void *) { heard.push_back(std::string("second:") + key); });
+	signal.addListener(note("other"));
+	laterId = signal.addListener(note("later"));
 	signal.emit("one", nullptr);
-	EXPECT_EQ(heard, (std::vector<std::string>{"first:one", "second:one"}));
-	heard.clear();
 	signal.emit("two", nullptr);
-	EXPECT_EQ(heard, (std::vector<std::string>{"first:two", "second:two", "new:two"}));
+	EXPECT_EQ(heard, (Heard{"self:one", "other:one", "other:two", "new:two"}));
+	EXPECT_EQ(signal.getListenerCount(), 2u);
+	signal.removeListener(selfId); // logs, changes nothing
+	EXPECT_EQ(signal.getListenerCount(), 2u);
+
+	heard.clear();
+	Signal *doomed = new Signal();
+	doomed->addListener([&](const char *key, void *) {
+		note("deleter")(key, nullptr);
+		delete doomed;
+	});
+	doomed->addListener(note("after"));
+	doomed->emit("k", nullptr);
+	EXPECT_EQ(heard, (Heard{"deleter:k"}));
 }
 
-// An owner deleted between emissions or during one takes its listener along.
+// An owner deleted between emissions or during one takes its listener along, also one not yet joined;
+// owners may outlive the signal.
 TEST_F(WSignalTest, OwnerDeletionDropsTheListener)
 {
 	Signal signal;
-	Evas_Object *owner = makeOwner(), *dying = makeOwner();
-	signal.addListener([&](const char *, void *) { heard.push_back("owned"); }, owner);
-	signal.addListener([&](const char *, void *) {
-		heard.push_back("free");
-		evas_object_del(dying);
+	Evas_Object *owner = makeOwner(), *dying = makeOwner(), *pendingOwner = makeOwner();
+	signal.addListener(note("owned"), owner);
+	signal.addListener([&](const char *key, void *) {
+		note("free")(key, nullptr);
+		if (dying) {
+			signal.addListener(note("pending"), pendingOwner);
+			evas_object_del(pendingOwner);
+			evas_object_del(dying);
+			dying = nullptr;
+		}
 	});
-	signal.addListener([&](const char *, void *) { heard.push_back("dying"); }, dying);
+	signal.addListener(note("dying"), dying);
 	evas_object_del(owner);
 	EXPECT_EQ(signal.getListenerCount(), 2u);
 	signal.emit("k", nullptr);
-	EXPECT_EQ(heard, (std::vector<std::string>{"free"}));
+	signal.emit("k", nullptr);
+	EXPECT_EQ(heard, (Heard{"free:k", "free:k"}));
 	EXPECT_EQ(signal.getListenerCount(), 1u);
-}
 
-TEST_F(WSignalTest, OwnerOfAPendingListenerDeletedBeforeItJoins)
-{
-	Signal signal;
-	Evas_Object *owner = makeOwner();
-	signal.addListener([&](const char *, void *) {
-		if (heard.empty())
-			signal.addListener([&](const char *, void *) { heard.push_back("pending"); }, owner);
-		heard.push_back("adder");
-		evas_object_del(owner);
-	});
-	signal.emit("k", nullptr);
-	signal.emit("k", nullptr);
-	EXPECT_EQ(heard, (std::vector<std::string>{"adder", "adder"}));
-}
-
-TEST_F(WSignalTest, OwnersOutliveTheSignal)
-{
-	Evas_Object *owner = makeOwner();
+	Evas_Object *survivor = makeOwner();
 	{
-		Signal signal;
-		signal.addListener([](const char *, void *) {}, owner);
-		signal.addListener([](const char *, void *) {}, owner);
+		Signal shortLived;
+		shortLived.addListener(note("x"), survivor);
+		shortLived.addListener(note("y"), survivor);
 	}
 	// The signal removed its delete callbacks; deleting the owner now must not reach it.
-	evas_object_del(owner);
-	SUCCEED();
-}
-
-TEST_F(WSignalTest, ListenerMayDeleteTheSignal)
-{
-	Signal *signal = new Signal();
-	signal->addListener([&](const char *, void *) {
-		heard.push_back("deleter");
-		delete signal;
-	});
-	signal->addListener([&](const char *, void *) { heard.push_back("after"); });
-	signal->emit("k", nullptr);
-	EXPECT_EQ(heard, (std::vector<std::string>{"deleter"}));
-}
-
-TEST_F(WSignalTest, EmptyFunctionThrowsAndTheSignalStaysUsable)
-{
-	Signal signal;
-	unsigned int emptyId = signal.addListener(Signal::Listener());
-	EXPECT_THROW(signal.emit("k", nullptr), std::bad_function_call);
-	signal.removeListener(emptyId);
-	signal.addListener([&](const char *, void *) { heard.push_back("late"); });
-	signal.emit("k", nullptr);
-	EXPECT_EQ(heard, (std::vector<std::string>{"late"}));
+	evas_object_del(survivor);
 }
 
 } // namespace

@@ -2,7 +2,6 @@
 #include <string>
 #include <vector>
 
-#include "TestEnv.h"
 #include "WGengridItem.h"
 #include "WMenuPopupController.h"
 #include "WPopupController.h"
@@ -36,8 +35,13 @@ protected:
 		EXPECT_TRUE(page->attachPopup(popup));
 		return popup;
 	}
-	// A shown menu with the given items, attached to page.
-	WMenuPopupController *openMenu(LoggingPage *page, std::vector<std::pair<const char *, std::function<void()>>> items)
+	static void click(WPopupController *popup, const char *part)
+	{
+		evas_object_smart_callback_call(elm_object_part_content_get(popup->getEvasObj(), part), "clicked", nullptr);
+	}
+	// Opens a menu with the given items on page and selects the item at index.
+	WViewControllerWeakPtr selectInMenu(LoggingPage *page,
+	                                    std::vector<std::pair<const char *, std::function<void()>>> items, int index)
 	{
 		WMenuPopupController *menu = new WMenuPopupController();
 		EXPECT_TRUE(menu->createMenu(window->getEvasObj(), naviframe->getEvasObj()));
@@ -45,11 +49,13 @@ protected:
 			EXPECT_TRUE(menu->appendItem(item.first, item.second));
 		EXPECT_TRUE(menu->showMenu());
 		EXPECT_TRUE(page->attachPopup(menu));
-		return menu;
-	}
-	static Evas_Object *button(WPopupController *popup, const char *part)
-	{
-		return elm_object_part_content_get(popup->getEvasObj(), part);
+		const Eina_List *elmItems = elm_ctxpopup_items_get(menu->getEvasObj());
+		EXPECT_EQ(eina_list_count(elmItems), items.size());
+		Elm_Object_Item *item = static_cast<Elm_Object_Item *>(eina_list_nth(elmItems, index));
+		EXPECT_STREQ(elm_object_item_text_get(item), items[index].first);
+		WViewControllerWeakPtr weak = menu->getWeakPtr();
+		elm_ctxpopup_item_selected_set(item, EINA_TRUE);
+		return weak;
 	}
 };
 
@@ -70,7 +76,7 @@ TEST_F(ViewControllerTest, ControllerDiesWithItsObjectAndItsWeakPointerEmpties)
 	EXPECT_EQ(log, (Log{"B:constructor", "B:destructor"}));
 }
 
-TEST_F(ViewControllerTest, PopupButtonClosesOnlyWhenItsFlagIsSet)
+TEST_F(ViewControllerTest, PopupClosesWhenItsButtonSaysSoOrWithItsViewAndIsReplacedByTheNext)
 {
 	LoggingPage *page = pushPage("A");
 	int cancelCalls = 0, okCalls = 0;
@@ -81,31 +87,22 @@ TEST_F(ViewControllerTest, PopupButtonClosesOnlyWhenItsFlagIsSet)
 		    *close = true;
 	    });
 	WViewControllerWeakPtr weak = popup->getWeakPtr();
-	ASSERT_NE(popup->getEvasObj(), nullptr);
 	EXPECT_EQ(page->getPopup(), popup);
-
-	evas_object_smart_callback_call(button(popup, "button1"), "clicked", nullptr);
+	click(popup, "button1");
 	EXPECT_EQ(cancelCalls, 1);
 	EXPECT_FALSE(weak.expired());
-
-	evas_object_smart_callback_call(button(popup, "button2"), "clicked", nullptr);
+	click(popup, "button2");
 	EXPECT_EQ(okCalls, 1);
 	EXPECT_TRUE(weak.expired());
 	EXPECT_EQ(page->getPopup(), nullptr);
 
-	// An empty button function leaves the popup open.
+	// An empty button function leaves the popup open; the next popup replaces it; the view takes the last along.
 	popup = attachPopup(page, nullptr);
 	weak = popup->getWeakPtr();
-	evas_object_smart_callback_call(button(popup, "button1"), "clicked", nullptr);
+	click(popup, "button1");
 	EXPECT_FALSE(weak.expired());
-}
-
-TEST_F(ViewControllerTest, PopupDiesWithItsViewAndIsReplacedByTheNext)
-{
-	LoggingPage *page = pushPage("A");
-	WViewControllerWeakPtr first = attachPopup(page, nullptr)->getWeakPtr();
 	WViewControllerWeakPtr second = attachPopup(page, nullptr)->getWeakPtr();
-	EXPECT_TRUE(first.expired());
+	EXPECT_TRUE(weak.expired());
 	ASSERT_FALSE(second.expired());
 	page->destroy();
 	EXPECT_TRUE(second.expired());
@@ -116,7 +113,6 @@ TEST_F(ViewControllerTest, BackKeyClosesThePopupBeforeThePage)
 	LoggingPage *a = pushPage("A");
 	LoggingPage *b = pushPage("B");
 	WViewControllerWeakPtr popup = attachPopup(b, nullptr)->getWeakPtr();
-	runFor(0.1);
 	pressKey("Escape");
 	EXPECT_TRUE(popup.expired());
 	EXPECT_EQ(naviframe->getTopContentViewController(), b);
@@ -124,44 +120,27 @@ TEST_F(ViewControllerTest, BackKeyClosesThePopupBeforeThePage)
 	ASSERT_TRUE(waitFor([&] { return naviframe->getTopContentViewController() == a; }));
 }
 
-TEST_F(ViewControllerTest, MenuRunsTheSelectedItemAndCloses)
+TEST_F(ViewControllerTest, MenuRunsTheSelectedItemAndClosesEvenWhenTheItemOpensAPopup)
 {
 	LoggingPage *page = pushPage("A");
 	Log picked;
-	WMenuPopupController *menu = openMenu(
-	    page, {{"first", [&] { picked.push_back("first"); }}, {"second", [&] { picked.push_back("second"); }}});
-	WViewControllerWeakPtr weak = menu->getWeakPtr();
-
-	const Eina_List *items = elm_ctxpopup_items_get(menu->getEvasObj());
-	ASSERT_EQ(eina_list_count(items), 2u);
-	EXPECT_STREQ(elm_object_item_text_get(static_cast<Elm_Object_Item *>(eina_list_data_get(items))), "first");
-	Elm_Object_Item *second = static_cast<Elm_Object_Item *>(eina_list_nth(items, 1));
-	elm_ctxpopup_item_selected_set(second, EINA_TRUE);
-	ASSERT_TRUE(waitFor([&] { return weak.expired(); }));
+	WViewControllerWeakPtr menu = selectInMenu(
+	    page, {{"first", [&] { picked.push_back("first"); }}, {"second", [&] { picked.push_back("second"); }}}, 1);
+	ASSERT_TRUE(waitFor([&] { return menu.expired(); }));
 	EXPECT_EQ(picked, (Log{"second"}));
-}
 
-TEST_F(ViewControllerTest, MenuItemMayReplaceTheMenuByAPopup)
-{
-	LoggingPage *page = pushPage("A");
-	WMenuPopupController *menu = openMenu(page, {{"delete", [&] { attachPopup(page, nullptr); }}});
-	WViewControllerWeakPtr weak = menu->getWeakPtr();
-	Elm_Object_Item *item =
-	    static_cast<Elm_Object_Item *>(eina_list_data_get(elm_ctxpopup_items_get(menu->getEvasObj())));
-	elm_ctxpopup_item_selected_set(item, EINA_TRUE);
-	ASSERT_TRUE(waitFor([&] { return weak.expired(); }));
+	menu = selectInMenu(page, {{"delete", [&] { attachPopup(page, nullptr); }}}, 0);
+	ASSERT_TRUE(waitFor([&] { return menu.expired(); }));
 	ASSERT_NE(page->getPopup(), nullptr);
 	EXPECT_STREQ(page->getPopup()->getClassName(), "WPopupController");
 }
 
-TEST_F(ViewControllerTest, TimerRepeatsUntilFalseAndDiesWithItsOwner)
+TEST_F(ViewControllerTest, TimersAndIdlersEndWithFalseOrWithTheirOwner)
 {
 	int ticks = 0;
 	WUiTimer::addTimer(
 	    0.01, [&](void *data) { return ++*static_cast<int *>(data) < 3; }, &ticks);
 	ASSERT_TRUE(waitFor([&] { return ticks == 3; }));
-	runFor(0.1);
-	EXPECT_EQ(ticks, 3);
 
 	LoggingPage *page = pushPage("A");
 	int ownedTicks = 0;
@@ -171,8 +150,6 @@ TEST_F(ViewControllerTest, TimerRepeatsUntilFalseAndDiesWithItsOwner)
 	page->destroy();
 	EXPECT_TRUE(handle.expired());
 	int after = ownedTicks;
-	runFor(0.1);
-	EXPECT_EQ(ownedTicks, after);
 
 	// A deleted timer never runs; deleting it again does nothing.
 	int runs = 0;
@@ -180,26 +157,24 @@ TEST_F(ViewControllerTest, TimerRepeatsUntilFalseAndDiesWithItsOwner)
 	    0.0, [&](void *) { return ++runs > 0; }, nullptr);
 	WUiTimer::deleteTimer(handle);
 	EXPECT_TRUE(handle.expired());
-	runFor(0.05);
-	EXPECT_EQ(runs, 0);
 	WUiTimer::deleteTimer(handle);
-}
 
-TEST_F(ViewControllerTest, IdlerThatDeletesItsOwnerEndsCleanly)
-{
-	LoggingPage *page = pushPage("A");
-	int runs = 0;
+	// An idler that deletes its owner runs once and ends cleanly.
+	page = pushPage("B");
+	int idlerRuns = 0;
 	WUiTimer::addIdler(
 	    [&](void *) {
-		    ++runs;
+		    ++idlerRuns;
 		    page->destroy();
 		    return true;
 	    },
 	    nullptr, page->getEvasObj());
-	// Plain iteration, as the other test suites pump the loop, must run it too.
-	ASSERT_TRUE(memo_test::pump(3.0, [&] { return runs == 1; }));
-	memo_test::pumpFor(0.1);
-	EXPECT_EQ(runs, 1);
+	ASSERT_TRUE(waitFor([&] { return idlerRuns == 1; }));
+	runFor(0.05);
+	EXPECT_EQ(ticks, 3);
+	EXPECT_EQ(ownedTicks, after);
+	EXPECT_EQ(runs, 0);
+	EXPECT_EQ(idlerRuns, 1);
 }
 
 struct CountingItem : WGengridItem {

@@ -2,6 +2,7 @@
 
 #include <Ecore.h>
 #include <Ecore_Evas.h>
+#include <Elementary.h>
 
 #include <cstdio>
 #include <cstdlib>
@@ -15,9 +16,10 @@ namespace memo_test
 {
 const std::string &tempRoot()
 {
+	// In memory where possible: SQLite and the key stores sync every write, which costs a disk seconds.
 	static const std::string root = [] {
-		char tmpl[] = "/tmp/memo-test-XXXXXX";
-		return std::string(mkdtemp(tmpl) ? tmpl : "");
+		char shm[] = "/dev/shm/memo-test-XXXXXX", tmp[] = "/tmp/memo-test-XXXXXX";
+		return std::string(mkdtemp(shm) ? shm : mkdtemp(tmp) ? tmp : "");
 	}();
 	return root;
 }
@@ -45,6 +47,32 @@ bool pump(double timeoutSec, const std::function<bool()> &pred)
 void pumpFor(double seconds)
 {
 	pump(seconds, [] { return false; });
+}
+
+void initElementary()
+{
+	static int ready = elm_init(0, nullptr);
+	(void)ready;
+}
+
+Evas_Object *addShownWindow(const char *name)
+{
+	initElementary();
+	Evas_Object *win = elm_win_add(nullptr, name, ELM_WIN_BASIC);
+	evas_object_resize(win, 480, 800);
+	evas_object_show(win);
+	waitForFrame(win);
+	return win;
+}
+
+bool waitForFrame(Evas_Object *win)
+{
+	bool rendered = false;
+	Evas_Event_Cb renderedCb = [](void *data, Evas *, void *) { *static_cast<bool *>(data) = true; };
+	evas_event_callback_add(evas_object_evas_get(win), EVAS_CALLBACK_RENDER_POST, renderedCb, &rendered);
+	pump(5.0, [&] { return rendered; });
+	evas_event_callback_del_full(evas_object_evas_get(win), EVAS_CALLBACK_RENDER_POST, renderedCb, &rendered);
+	return rendered;
 }
 
 std::string helperPath(const std::string &name)

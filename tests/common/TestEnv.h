@@ -22,6 +22,15 @@ bool pump(double timeoutSec, const std::function<bool()> &pred);
 // Iterates the main loop for the given time.
 void pumpFor(double seconds);
 
+// Elementary up, once per process.
+void initElementary();
+
+// Elementary up and a shown 480 x 800 window, returned after its first frame.
+Evas_Object *addShownWindow(const char *name);
+
+// Waits for the next frame of a shown window: after the first one its content is visible and takes keys.
+bool waitForFrame(Evas_Object *win);
+
 // Path of a helper process built from tests/helpers/<name>.c(pp).
 std::string helperPath(const std::string &name);
 

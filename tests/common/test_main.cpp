@@ -3,15 +3,41 @@
 
 #include <gtest/gtest.h>
 
+#include <csignal>
+#include <cstdio>
 #include <cstdlib>
+#include <dirent.h>
 #include <string>
 #include <sys/stat.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 static void setDir(const char *var, const std::string &path)
 {
 	mkdir(path.c_str(), 0700);
 	setenv(var, path.c_str(), 1);
+}
+
+// Elementary starts an efreetd for the process (in its private runtime folder). The daemon and the cache
+// builders it starts keep our output open and write into the temporary root after we end: end them with us.
+static void endChildren(pid_t parent, const char *onlyName)
+{
+	DIR *proc = opendir("/proc");
+	for (dirent *e; proc && (e = readdir(proc));) {
+		std::string dir = std::string("/proc/") + e->d_name;
+		std::string stat = memo_test::readFile(dir + "/stat");
+		int ppid = 0;
+		size_t end = stat.rfind(')');
+		if (end == std::string::npos || sscanf(stat.c_str() + end + 1, " %*c %d", &ppid) != 1 || ppid != parent ||
+		    (onlyName && memo_test::readFile(dir + "/comm") != std::string(onlyName) + "\n"))
+			continue;
+		pid_t pid = atoi(e->d_name);
+		endChildren(pid, nullptr);
+		kill(pid, SIGKILL);
+		waitpid(pid, nullptr, 0);
+	}
+	if (proc)
+		closedir(proc);
 }
 
 int main(int argc, char **argv)
@@ -40,6 +66,7 @@ int main(int argc, char **argv)
 
 	testing::InitGoogleTest(&argc, argv);
 	int rc = RUN_ALL_TESTS();
+	endChildren(getpid(), "efreetd");
 	if (!getenv("MEMO_TEST_KEEP"))
 		memo_test::runCommand("rm -rf '" + r + "'");
 	return rc;

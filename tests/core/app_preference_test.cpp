@@ -15,14 +15,11 @@ namespace
 class AppPreferenceTest : public ::testing::Test
 {
 protected:
-	static void SetUpTestSuite()
+	void SetUp() override
 	{
-		static char arg0[] = "app-preference-test";
-		static char *argv[] = {arg0, nullptr};
-		elm_init(1, argv);
+		memo_test::initElementary();
+		preference_remove_all();
 	}
-
-	void SetUp() override { preference_remove_all(); }
 
 	void TearDown() override { endApp(); }
 
@@ -74,7 +71,7 @@ protected:
 	BusRecorder bus;
 };
 
-TEST_F(AppPreferenceTest, firstRunWritesTheFiveDefaultsSilently)
+TEST_F(AppPreferenceTest, firstRunWritesTheFiveDefaultsSilentlyThenSyncStatesAreBroadcast)
 {
 	startApp();
 	EXPECT_EQ(prefInt("MEMO_SVC_PROCESSING"), 0);
@@ -83,9 +80,14 @@ TEST_F(AppPreferenceTest, firstRunWritesTheFiveDefaultsSilently)
 	EXPECT_EQ(prefString("QUICK_MEMO_ADD_DATA"), "");
 	EXPECT_EQ(prefInt("QUICK_MEMO_STATE"), 0);
 
-	// The first thing heard is the other side's change: writing the defaults raised nothing.
+	// The first thing heard is the other side's change: writing the defaults raised nothing. Then each
+	// state of the sync service is told on the bus.
 	otherProcessSets("MEMO_SVC_PROCESSING", 1, 1);
-	EXPECT_EQ(bus.keys, std::vector<std::string>{"broadcast,sync,restore"});
+	otherProcessSets("MEMO_SVC_PROCESSING", 2, 2);
+	otherProcessSets("MEMO_SVC_PROCESSING", 7, 3);
+	otherProcessSets("MEMO_SVC_PROCESSING", 0, 4);
+	EXPECT_EQ(bus.keys, (std::vector<std::string>{"broadcast,sync,restore", "broadcast,sync,backup",
+	                                              "broadcast,sync,idle", "broadcast,sync,idle"}));
 }
 
 TEST_F(AppPreferenceTest, laterStartKeepsTheSyncStateAndWritesNoDefaults)
@@ -99,17 +101,6 @@ TEST_F(AppPreferenceTest, laterStartKeepsTheSyncStateAndWritesNoDefaults)
 
 	otherProcessSets("MEMO_SVC_PROCESSING", 0, 1);
 	EXPECT_EQ(bus.keys, std::vector<std::string>{"broadcast,sync,idle"});
-}
-
-TEST_F(AppPreferenceTest, syncServiceStatesFromAnotherProcess)
-{
-	startApp();
-	otherProcessSets("MEMO_SVC_PROCESSING", 1, 1);
-	otherProcessSets("MEMO_SVC_PROCESSING", 2, 2);
-	otherProcessSets("MEMO_SVC_PROCESSING", 7, 3);
-	otherProcessSets("MEMO_SVC_PROCESSING", 0, 4);
-	EXPECT_EQ(bus.keys, (std::vector<std::string>{"broadcast,sync,restore", "broadcast,sync,backup",
-	                                              "broadcast,sync,idle", "broadcast,sync,idle"}));
 }
 
 TEST_F(AppPreferenceTest, cloudTriggeringReachesTheListOrTheBus)

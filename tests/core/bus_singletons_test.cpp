@@ -22,20 +22,7 @@ namespace
 class BusTest : public ::testing::Test
 {
 protected:
-	static void SetUpTestSuite()
-	{
-		static char arg0[] = "bus-test";
-		static char *argv[] = {arg0, nullptr};
-		elm_init(1, argv);
-	}
-
-	void SetUp() override
-	{
-		win = elm_win_add(nullptr, "bus-test", ELM_WIN_BASIC);
-		ASSERT_NE(win, nullptr);
-		evas_object_resize(win, 480, 800);
-		evas_object_show(win);
-	}
+	void SetUp() override { win = memo_test::addShownWindow("bus-test"); }
 
 	void TearDown() override
 	{
@@ -57,35 +44,22 @@ protected:
 	Evas_Object *win = nullptr;
 };
 
-TEST_F(BusTest, popupClosedOnItsOwnIsNotAlive)
+TEST_F(BusTest, onlyTheLastPopupCountsWhileItStandsAndUntilDestroy)
 {
 	MemoPopupMonitor *monitor = MemoPopupMonitor::getInstance();
 	EXPECT_FALSE(monitor->isPopupAlive());
-	WPopupController *popup = openPopup("closes by itself");
-	monitor->addPopup(popup);
-	monitor->addPopup(nullptr); // changes nothing
-	ASSERT_TRUE(monitor->isPopupAlive());
-	EXPECT_EQ(monitor->getPopup(), popup);
-
-	// Gone without a word to the monitor, as when the back key or a button closes it.
-	evas_object_del(popup->getEvasObj());
-	memo_test::pumpFor(0.02);
-	EXPECT_FALSE(monitor->isPopupAlive());
-	EXPECT_EQ(monitor->getPopup(), nullptr);
-}
-
-TEST_F(BusTest, onlyTheLastPopupCountsUntilDestroy)
-{
-	MemoPopupMonitor *monitor = MemoPopupMonitor::getInstance();
 	WPopupController *first = openPopup("first");
 	WPopupController *second = openPopup("second");
 	monitor->addPopup(first);
 	monitor->addPopup(second);
+	monitor->addPopup(nullptr); // changes nothing
+	ASSERT_TRUE(monitor->isPopupAlive());
 	EXPECT_EQ(monitor->getPopup(), second);
 
-	second->destroy();
+	// Gone without a word to the monitor, as when the back key or a button closes it. The first one still
+	// stands, but the monitor has forgotten it.
+	evas_object_del(second->getEvasObj());
 	memo_test::pumpFor(0.02);
-	// The first one still stands, but the monitor has forgotten it.
 	EXPECT_NE(first->getEvasObj(), nullptr);
 	EXPECT_FALSE(monitor->isPopupAlive());
 	EXPECT_EQ(monitor->getPopup(), nullptr);

@@ -163,9 +163,10 @@ TEST_F(StoreMemo, FavouriteAndHidingLeaveTimeAndNotices)
 	EXPECT_TRUE(db()->setHiddenMemos(nullptr, 0));
 }
 
-TEST_F(StoreMemo, SearchUsesLikeAsItStands)
+TEST_F(StoreMemo, SearchUsesLikeAsItStandsAndFindsTheQuickMemoByItsHeaderWords)
 {
 	ASSERT_NE(nullptr, db());
+	std::string quick = quickColumn("UUID");
 	db()->excuteSql("UPDATE memo SET strippedContent = 'groceries' WHERE isQuick = 1");
 	std::string quote = addMemo("Bob's list", "", 1000);
 	std::string body = addMemo("plain", "a memo about cats", 2000);
@@ -177,18 +178,11 @@ TEST_F(StoreMemo, SearchUsesLikeAsItStands)
 	// Favourites first, then newest; hidden rows are the caller's to filter.
 	EXPECT_EQ((Strings{fav, hidden, body}), search("cats"));
 	EXPECT_EQ((Strings{}), search("zebra"));
-}
-
-TEST_F(StoreMemo, SearchFindsTheQuickMemoByItsHeaderWords)
-{
-	ASSERT_NE(nullptr, db());
-	std::string quick = quickColumn("UUID");
-	std::string body = addMemo("plain", "a memo about cats", 2000);
-	const char *language = getenv("LANGUAGE");
-	std::string saved = language ? language : "";
 
 	// Whatever the language, "quick memo" names it, and the quick memo stands first; the translated header
 	// counts as well. The header words match case-sensitively (LIKE itself does not).
+	const char *language = getenv("LANGUAGE");
+	std::string saved = language ? language : "";
 	struct {
 		const char *language, *text;
 		Strings found;

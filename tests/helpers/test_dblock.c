@@ -1,5 +1,5 @@
 /* Holds a write lock on a SQLite file for a while, as the sync service would.
-   Usage: test_dblock <db path> <seconds> <ready file>
+   Usage: test_dblock <db path> <seconds, fractions allowed> <ready file>
    Takes the lock, creates <ready file>, sleeps, then commits. Exit status 1 when the lock cannot be had. */
 #include <sqlite3.h>
 #include <stdio.h>
@@ -23,7 +23,7 @@ int main(int argc, char **argv)
 	FILE *ready = fopen(argv[3], "w");
 	if (ready)
 		fclose(ready);
-	sleep((unsigned)atoi(argv[2]));
+	usleep((useconds_t)(atof(argv[2]) * 1e6));
 	sqlite3_exec(db, "COMMIT", NULL, NULL, NULL);
 	sqlite3_close(db);
 	return 0;

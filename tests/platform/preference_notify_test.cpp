@@ -11,18 +11,14 @@
 
 namespace
 {
-struct Seen {
-	std::vector<std::string> keys;
-	std::vector<int> values;
-};
+// "<key>=<value>" for each call.
+using Seen = std::vector<std::string>;
 
 void recordCb(const char *key, void *data)
 {
-	auto *seen = static_cast<Seen *>(data);
 	int v = -1;
 	preference_get_int(key, &v);
-	seen->keys.push_back(key);
-	seen->values.push_back(v);
+	static_cast<Seen *>(data)->push_back(std::string(key) + "=" + std::to_string(v));
 }
 
 class PreferenceNotify : public testing::Test
@@ -32,41 +28,43 @@ protected:
 	{
 		ecore_init();
 		ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_remove_all());
-		memo_test::pumpFor(0.05); // drop notices of the cleanup
 	}
 	void TearDown() override { ecore_shutdown(); }
 
-	static int runWriter(const std::string &args)
+	static void otherProcessSets(const char *key, int value)
 	{
-		return memo_test::runCommand(memo_test::helperPath("test_writer") + " " + args);
+		std::string cmd = memo_test::helperPath("test_writer") + " pref-int " + key + " " + std::to_string(value);
+		ASSERT_EQ(0, memo_test::runCommand(cmd));
+	}
+	static bool waitFor(const Seen &seen, size_t count)
+	{
+		return memo_test::pump(5, [&] { return seen.size() >= count; });
 	}
 };
 } // namespace
 
-TEST_F(PreferenceNotify, WritesOfAnotherProcessReachTheCallbackUntilUnset)
+TEST_F(PreferenceNotify, WritesOfEitherProcessReachTheCallbackUntilUnset)
 {
 	Seen seen;
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("MEMO_SVC_PROCESSING", 0));
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("CLOUD_TRIGGERING", 0));
-	memo_test::pumpFor(0.05);
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_changed_cb("MEMO_SVC_PROCESSING", recordCb, &seen));
-
-	ASSERT_EQ(0, runWriter("pref-int MEMO_SVC_PROCESSING 2"));
-	ASSERT_TRUE(memo_test::pump(5, [&] { return seen.keys.size() == 1; }));
-	EXPECT_EQ("MEMO_SVC_PROCESSING", seen.keys[0]);
-	EXPECT_EQ(2, seen.values[0]);
-
+	otherProcessSets("MEMO_SVC_PROCESSING", 2);
+	ASSERT_TRUE(waitFor(seen, 1));
 	// The same value again still counts as a change; a different key does not reach this callback.
-	ASSERT_EQ(0, runWriter("pref-int CLOUD_TRIGGERING 1"));
+	otherProcessSets("CLOUD_TRIGGERING", 1);
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("MEMO_SVC_PROCESSING", 2));
-	ASSERT_TRUE(memo_test::pump(5, [&] { return seen.keys.size() == 2; }));
-	EXPECT_EQ("MEMO_SVC_PROCESSING", seen.keys[1]);
+	ASSERT_TRUE(waitFor(seen, 2));
 
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_unset_changed_cb("MEMO_SVC_PROCESSING"));
-	ASSERT_EQ(0, runWriter("pref-int MEMO_SVC_PROCESSING 1"));
-	memo_test::pumpFor(0.3);
-	EXPECT_EQ(2u, seen.keys.size());
 	EXPECT_NE(PREFERENCE_ERROR_NONE, preference_unset_changed_cb("MEMO_SVC_PROCESSING"));
+	// Notices come in order: the one of the later key marks that the unset key was passed over.
+	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_changed_cb("CLOUD_TRIGGERING", recordCb, &seen));
+	otherProcessSets("MEMO_SVC_PROCESSING", 1);
+	otherProcessSets("CLOUD_TRIGGERING", 5);
+	ASSERT_TRUE(waitFor(seen, 3));
+	EXPECT_EQ((Seen{"MEMO_SVC_PROCESSING=2", "MEMO_SVC_PROCESSING=2", "CLOUD_TRIGGERING=5"}), seen);
+	EXPECT_EQ(PREFERENCE_ERROR_NONE, preference_unset_changed_cb("CLOUD_TRIGGERING"));
 }
 
 TEST_F(PreferenceNotify, RegistrationNeedsAnExistingKeyAndASecondOneReplacesTheFirst)
@@ -78,16 +76,14 @@ TEST_F(PreferenceNotify, RegistrationNeedsAnExistingKeyAndASecondOneReplacesTheF
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_changed_cb("k", recordCb, &first));
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_changed_cb("k", recordCb, &second));
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("k", 3));
-	ASSERT_TRUE(memo_test::pump(5, [&] { return second.keys.size() == 1; }));
-	EXPECT_TRUE(first.keys.empty());
+	ASSERT_TRUE(waitFor(second, 1));
+	EXPECT_TRUE(first.empty());
 
 	// A removal calls nothing, and the callback is still there when the key comes back.
-	ASSERT_EQ(0, runWriter("pref-remove k"));
-	ASSERT_EQ(0, runWriter("pref-int k 4"));
-	ASSERT_TRUE(memo_test::pump(5, [&] { return second.keys.size() == 2; }));
-	EXPECT_EQ(4, second.values[1]);
-	memo_test::pumpFor(0.1);
-	EXPECT_EQ(2u, second.keys.size());
+	ASSERT_EQ(0, memo_test::runCommand(memo_test::helperPath("test_writer") + " pref-remove k"));
+	otherProcessSets("k", 4);
+	ASSERT_TRUE(waitFor(second, 2));
+	EXPECT_EQ((Seen{"k=3", "k=4"}), second);
 	EXPECT_EQ(PREFERENCE_ERROR_NONE, preference_unset_changed_cb("k"));
 }
 
@@ -113,8 +109,8 @@ TEST_F(PreferenceNotify, CallbacksMayUnsetThemselves)
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("self", 1));
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("self", 2));
 	ASSERT_TRUE(memo_test::pump(5, [] { return gSelfRemovingCalls > 0; }));
-	ASSERT_EQ(0, runWriter("pref-int other 9"));
-	ASSERT_TRUE(memo_test::pump(5, [] { return !gOther.values.empty() && gOther.values.back() == 9; }));
+	otherProcessSets("other", 9);
+	ASSERT_TRUE(memo_test::pump(5, [] { return !gOther.empty() && gOther.back() == "other=9"; }));
 	EXPECT_EQ(1, gSelfRemovingCalls);
 	EXPECT_EQ(PREFERENCE_ERROR_NONE, preference_unset_changed_cb("other"));
 }

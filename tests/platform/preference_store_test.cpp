@@ -18,27 +18,27 @@ protected:
 	void SetUp() override { ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_remove_all()); }
 };
 
-std::string getString(const char *key, int *rc = nullptr)
+// The string value, or "<error code>" when the read fails.
+std::string getString(const char *key)
 {
 	char *value = nullptr;
-	int r = preference_get_string(key, &value);
-	if (rc)
-		*rc = r;
-	std::string s = value ? value : "<null>";
+	int rc = preference_get_string(key, &value);
+	std::string s = rc == PREFERENCE_ERROR_NONE ? value : "<" + std::to_string(rc) + ">";
 	free(value);
 	return s;
+}
+
+bool exists(const char *key)
+{
+	bool b = false;
+	EXPECT_EQ(PREFERENCE_ERROR_NONE, preference_is_existing(key, &b));
+	return b;
 }
 
 bool collectKeyCb(const char *key, void *data)
 {
 	static_cast<std::set<std::string> *>(data)->insert(key);
 	return true;
-}
-
-bool stopAtFirstCb(const char *, void *data)
-{
-	++*static_cast<int *>(data);
-	return false;
 }
 } // namespace
 
@@ -62,45 +62,35 @@ TEST_F(PreferenceStore, ValuesKeepTheirTypeAndTheGetterChecksIt)
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_string("empty", ""));
 	EXPECT_EQ("", getString("empty"));
 
-	// Reading as another type is refused and leaves the output alone.
+	// Reading as another type is refused and leaves the output alone; a setter replaces the type.
 	i = 77;
 	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_get_int("s", &i));
 	EXPECT_EQ(77, i);
 	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_get_boolean("i", &b));
-	int rc = 0;
-	getString("i", &rc);
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, rc);
-
-	// A setter replaces a value of another type.
+	EXPECT_EQ("<" + std::to_string(PREFERENCE_ERROR_INVALID_PARAMETER) + ">", getString("i"));
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("s", 5));
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_get_int("s", &i));
 	EXPECT_EQ(5, i);
 }
 
-TEST_F(PreferenceStore, MissingKeysAndNullArguments)
+TEST_F(PreferenceStore, MissingKeysBadNamesAndRemoval)
 {
 	int i = 0;
-	bool b = true;
-	EXPECT_EQ(PREFERENCE_ERROR_NO_KEY, preference_get_int("absent", &i));
 	EXPECT_EQ(static_cast<int>(0xfef00030), PREFERENCE_ERROR_NO_KEY);
+	EXPECT_EQ(PREFERENCE_ERROR_NO_KEY, preference_get_int("absent", &i));
 	EXPECT_EQ(PREFERENCE_ERROR_NO_KEY, preference_remove("absent"));
-	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_is_existing("absent", &b));
-	EXPECT_FALSE(b);
-
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_set_int(nullptr, 1));
+	EXPECT_FALSE(exists("absent"));
 	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_set_int("", 1));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_set_string("k", nullptr));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_get_int("k", nullptr));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_get_string(nullptr, nullptr));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_get_boolean(nullptr, &b));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_get_double("k", nullptr));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_is_existing(nullptr, &b));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_is_existing("k", nullptr));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_remove(nullptr));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_foreach_item(nullptr, nullptr));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_set_changed_cb(nullptr, nullptr, nullptr));
-	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_unset_changed_cb(nullptr));
 	EXPECT_EQ(PREFERENCE_ERROR_INVALID_PARAMETER, preference_set_int(std::string(300, 'x').c_str(), 1));
+
+	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("x", 1));
+	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_string("y", "v"));
+	EXPECT_TRUE(exists("x"));
+	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_remove("x"));
+	EXPECT_FALSE(exists("x"));
+	EXPECT_TRUE(exists("y"));
+	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_remove_all());
+	EXPECT_FALSE(exists("y"));
 }
 
 TEST_F(PreferenceStore, OddKeyNamesAreDistinctKeys)
@@ -119,24 +109,11 @@ TEST_F(PreferenceStore, OddKeyNamesAreDistinctKeys)
 	std::set<std::string> listed;
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_foreach_item(collectKeyCb, &listed));
 	EXPECT_EQ(keys, listed);
+	// Iteration stops when the callback answers false.
 	int calls = 0;
+	auto stopAtFirstCb = [](const char *, void *data) { return ++*static_cast<int *>(data) < 0; };
 	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_foreach_item(stopAtFirstCb, &calls));
 	EXPECT_EQ(1, calls);
-}
-
-TEST_F(PreferenceStore, RemoveAndRemoveAll)
-{
-	bool existing = false;
-	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_int("x", 1));
-	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_set_string("y", "v"));
-	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_is_existing("x", &existing));
-	EXPECT_TRUE(existing);
-	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_remove("x"));
-	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_is_existing("x", &existing));
-	EXPECT_FALSE(existing);
-	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_remove_all());
-	ASSERT_EQ(PREFERENCE_ERROR_NONE, preference_is_existing("y", &existing));
-	EXPECT_FALSE(existing);
 }
 
 TEST_F(PreferenceStore, ValuesLiveInTheDataFolderAndReachOtherProcesses)
@@ -152,7 +129,5 @@ TEST_F(PreferenceStore, ValuesLiveInTheDataFolderAndReachOtherProcesses)
 	ASSERT_EQ(0, memo_test::runCommand(writer + " pref-string QUICK_MEMO_ADD_DATA 'from there'"));
 	EXPECT_EQ("from there", getString("QUICK_MEMO_ADD_DATA"));
 	ASSERT_EQ(0, memo_test::runCommand(writer + " pref-remove QUICK_MEMO_ADD_DATA"));
-	int rc = 0;
-	getString("QUICK_MEMO_ADD_DATA", &rc);
-	EXPECT_EQ(PREFERENCE_ERROR_NO_KEY, rc);
+	EXPECT_FALSE(exists("QUICK_MEMO_ADD_DATA"));
 }

