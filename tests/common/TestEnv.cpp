@@ -1,3 +1,4 @@
+#include <sys/statvfs.h>
 #include "TestEnv.h"
 
 #include <Ecore.h>
@@ -16,10 +17,13 @@ namespace memo_test
 {
 const std::string &tempRoot()
 {
-	// In memory where possible: SQLite and the key stores sync every write, which costs a disk seconds.
+	// In memory where there is room: SQLite and the key stores sync every write, which costs a disk
+	// seconds. Containers often mount a small /dev/shm, so it needs 512 MiB free.
 	static const std::string root = [] {
 		char shm[] = "/dev/shm/memo-test-XXXXXX", tmp[] = "/tmp/memo-test-XXXXXX";
-		return std::string(mkdtemp(shm) ? shm : mkdtemp(tmp) ? tmp : "");
+		struct statvfs fs;
+		bool roomy = statvfs("/dev/shm", &fs) == 0 && (unsigned long long)fs.f_bavail * fs.f_frsize >= (512ull << 20);
+		return std::string(roomy && mkdtemp(shm) ? shm : mkdtemp(tmp) ? tmp : "");
 	}();
 	return root;
 }
