@@ -1,4 +1,3 @@
-#include <sys/statvfs.h>
 #include "TestEnv.h"
 
 #include <Ecore.h>
@@ -10,6 +9,7 @@
 #include <fstream>
 #include <sstream>
 #include <sys/stat.h>
+#include <sys/statvfs.h>
 #include <sys/wait.h>
 #include <vector>
 
