@@ -248,8 +248,9 @@ void MemoApp::__saveOpenEditor()
 	const char *className = top ? top->getClassName() : nullptr;
 	if (!className || strcmp(className, "MemoEditView"))
 		return;
-	MemoEditView *editView = static_cast<MemoEditView *>(top);
-	if (!editView->isDiscarded())
+	// The name says which page it is; the cast makes sure of the type before the call.
+	MemoEditView *editView = dynamic_cast<MemoEditView *>(top);
+	if (editView && !editView->isDiscarded())
 		editView->saveOnExit();
 }
 

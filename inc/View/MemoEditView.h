@@ -131,6 +131,8 @@ private:
 	// ---- Voice (MemoEditViewVoice.cpp) ----
 	// True while a recorder holds a recording handle, that is while it records.
 	bool __isRecording() const;
+	// Stops the recording for a save; false when it stayed under one second and is not kept.
+	bool __stopRecording();
 	// The voice panel is free: no live player, and no recorder or a finished one.
 	bool __isVoicePanelFree() const;
 	void __deleteRecorder();

@@ -107,7 +107,7 @@ void MemoEditView::__doneBtnCb(void *data, Evas_Object *obj, void *eventInfo)
 	if (!self->__canSave)
 		return;
 	self->__destroyAttachPanel();
-	if (self->__isRecorderDeleted == 0 && self->__recorder && self->__isRecording()) {
+	if (self->__isRecorderDeleted == 0 && self->__recorder && self->__isRecording() && !self->__stopRecording()) {
 		// A recording under one second is not kept, and the memo is not saved with it: the user stays.
 		MEMO_LOGI("Not saved. Recording time is less than 1 sec.");
 		return;
@@ -236,8 +236,10 @@ void MemoEditView::saveOnExit()
 {
 	if (__mode == MODE_VIEW)
 		return;
-	if (__isRecorderDeleted == 0 && __recorder && __isRecording())
+	if (__isRecorderDeleted == 0 && __recorder && __isRecording()) {
+		__stopRecording();
 		notification_status_message_post(i18n_get_text("IDS_MEMO_TPOP_RECORDING_SAVED"));
+	}
 	// No change test: an untouched edit is written too, with a new stamp.
 	if (!__saveMemo())
 		MEMO_LOGE("memo %s was not saved at exit", __UUID ? __UUID : "");

