@@ -156,7 +156,7 @@ static bool colorClassIs(const char *name, int r, int g, int b)
 	return cr == r && cg == g && cb == b;
 }
 
-TEST_F(AppLifecycleTest, startRunsTheLifecycleInOrderAndBuildsAnEmptyWindow)
+TEST_F(AppLifecycleTest, startRunsTheLifecycleInOrderAndShowsOneFirstPage)
 {
 	auto checkFirstScreen = [this] {
 		Evas_Object *win = window();
@@ -166,7 +166,10 @@ TEST_F(AppLifecycleTest, startRunsTheLifecycleInOrderAndBuildsAnEmptyWindow)
 		EXPECT_STREQ(current->getWindowController()->getName(), "com.veltron.memo");
 		app_assist::WNaviframeController *naviframe = app_test::naviframeOf(current);
 		ASSERT_NE(naviframe, nullptr);
-		EXPECT_EQ(naviframe->getContentViewCount(), 0);
+		// The first request pushed the one first page (a new memo until the list stands in its place).
+		EXPECT_EQ(naviframe->getContentViewCount(), 1);
+		ASSERT_NE(naviframe->getTopContentViewController(), nullptr);
+		EXPECT_STREQ(naviframe->getTopContentViewController()->getClassName(), "MemoEditView");
 
 		// The app's theme: its base layout holding the naviframe, its tables applied.
 		Evas_Object *baseLayout = current->getWindowController()->getBaseLayoutEvasObj();
