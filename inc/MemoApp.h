@@ -57,8 +57,15 @@ private:
 	app_assist::WNaviframeController *__getNaviframe() const;
 	app_assist::WContentViewController *__getTopView() const;
 	void __saveOpenEditor();
+	// ---- Launch requests (MemoAppControl.cpp, MemoAppShare.cpp) ----
 	// The one page the process begins with, for the first launch request.
 	void __pushFirstView(app_control_s *request, const char *operation);
+	// The memo list; with pick true it runs in pick mode and answers the request.
+	void __pushListView(bool pick, app_control_s *request);
+	// What a share request brings goes into the new memo on top: subject, text, a text file or a picture.
+	void __fillSharedMemo(app_control_s *request, const char *operation);
+	// Text for the quick memo: into the quick memo open in the editor, else into the store; then the reply.
+	void __addQuickMemoText(app_control_s *request);
 
 	static void __bindTextDomains();
 	static char *__getResourcePathN(const char *resourceId);

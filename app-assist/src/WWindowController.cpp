@@ -6,6 +6,7 @@
 #include <libintl.h>
 
 #include <app.h>
+#include <desktop/app_install.h>
 
 #include "WDefine.h"
 #include "WViewController.h"
@@ -17,11 +18,15 @@ static const char *BASE_LAYOUT_GROUP = "app-assist/base_layout";
 static const int DEFAULT_WIN_WIDTH = 480;
 static const int DEFAULT_WIN_HEIGHT = 800;
 
-// The theme of the base layout: APP_ASSIST_EDJ overrides the one built with the framework.
+// The theme of the base layout: APP_ASSIST_EDJ, else the one of an installed tree, else the one built with the
+// framework.
 static const char *__baseLayoutEdj()
 {
 	const char *path = getenv("APP_ASSIST_EDJ");
-	return (path && *path) ? path : APP_ASSIST_EDJ_PATH;
+	if (path && *path)
+		return path;
+	static char *installed = desktop_app_install_path_get("app-assist/app-assist.edj");
+	return installed ? installed : APP_ASSIST_EDJ_PATH;
 }
 
 // The window's first size: WAPP_WINDOW_SIZE="<width>x<height>" overrides the default.

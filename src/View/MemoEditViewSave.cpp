@@ -174,8 +174,13 @@ bool MemoEditView::__saveMemo()
 	gettimeofday(&now, nullptr);
 	const unsigned long long stamp = static_cast<unsigned long long>(now.tv_sec) * 1000ULL;
 	record->setMemoUUID(__UUID);
-	if (title)
-		record->setTitle(title);
+	if (title) {
+		// A record holds its title as markup and the store writes it as plain text: handed in plain, a title
+		// such as "Salt & pepper" would be stored as "Salt ".
+		char *markupTitle = elm_entry_utf8_to_markup(title);
+		record->setTitle(markupTitle ? markupTitle : title);
+		free(markupTitle);
+	}
 	bool composed = true;
 	if (*content) {
 		MemoCvt converter(MEMO_CVT_SRC_TODOLIST, content);

@@ -1,5 +1,6 @@
 /* Application identity and folders. Nothing here logs: dlog itself asks for the data path. */
 #include <app_common.h>
+#include <desktop/app_install.h>
 
 #include "app_private.h"
 
@@ -52,21 +53,34 @@ static char *xml_child_text_dup(xmlNode *node, const char *name)
 	return NULL;
 }
 
+/* The manifest's app element, or NULL when it names another program: tools installed beside the app's
+   program are not the app. */
+static xmlNode *manifest_app_node(xmlNode *root)
+{
+	for (xmlNode *c = root->children; c; c = c->next) {
+		if (c->type != XML_ELEMENT_NODE || strcmp((const char *)c->name, "ui-application"))
+			continue;
+		char *exec = xml_prop_dup(c, "exec");
+		bool other = exec && manifest.exe_name && strcmp(exec, manifest.exe_name);
+		free(exec);
+		return other ? NULL : c;
+	}
+	return root;
+}
+
 static void manifest_parse(const char *path)
 {
 	xmlDoc *doc = xmlReadFile(path, NULL, XML_PARSE_NOERROR | XML_PARSE_NOWARNING | XML_PARSE_NONET);
 	if (!doc)
 		return;
 	xmlNode *root = xmlDocGetRootElement(doc);
-	if (root && !strcmp((const char *)root->name, "manifest")) {
+	xmlNode *app_node = root && !strcmp((const char *)root->name, "manifest") ? manifest_app_node(root) : NULL;
+	if (app_node) {
 		manifest.version = xml_prop_dup(root, "version");
-		for (xmlNode *c = root->children; c; c = c->next) {
-			if (c->type != XML_ELEMENT_NODE || strcmp((const char *)c->name, "ui-application"))
-				continue;
-			manifest.app_id = xml_prop_dup(c, "appid");
-			manifest.label = xml_child_text_dup(c, "label");
-			manifest.icon = xml_child_text_dup(c, "icon");
-			break;
+		if (app_node != root) {
+			manifest.app_id = xml_prop_dup(app_node, "appid");
+			manifest.label = xml_child_text_dup(app_node, "label");
+			manifest.icon = xml_child_text_dup(app_node, "icon");
 		}
 		if (!manifest.app_id)
 			manifest.app_id = xml_prop_dup(root, "package");
@@ -302,4 +316,15 @@ int app_get_version(char **version)
 	if (!*version)
 		*version = strdup("1.0.0");
 	return *version ? APP_ERROR_NONE : APP_ERROR_OUT_OF_MEMORY;
+}
+
+char *desktop_app_install_path_get(const char *sub)
+{
+	const manifest_info_s *m = manifest_get();
+	if (!m->exe_dir || !sub)
+		return NULL;
+	char path[PATH_MAX];
+	snprintf(path, sizeof(path), "%s/../share/%s", m->exe_dir, sub);
+	char real[PATH_MAX];
+	return realpath(path, real) ? strdup(real) : NULL;
 }

@@ -41,7 +41,8 @@ typedef struct {
 	char *operations; /* comma-separated, may be NULL */
 } app_registry_entry_s;
 
-/* Looks the id up in TIZEN_APPS_DIR (colon-separated) and then the built-in folder; NULL if absent. */
+/* Looks the id up in TIZEN_APPS_DIR (colon-separated), the installed tree's folder and then the built-in one;
+   NULL if absent. */
 app_registry_entry_s *app_registry_find(const char *app_id);
 /* Calls cb for every entry (first folder wins for a duplicate id); cb returns false to stop. */
 void app_registry_foreach(bool (*cb)(const app_registry_entry_s *entry, void *data), void *data);

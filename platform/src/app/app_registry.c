@@ -1,7 +1,9 @@
-/* The launch registry: one "<id>.ini" file per app in the folders of TIZEN_APPS_DIR and the built-in one. */
+/* The launch registry: one "<id>.ini" file per app in the folders of TIZEN_APPS_DIR, the installed tree and the
+   built-in one. */
 #define _GNU_SOURCE
 #include "app_private.h"
 
+#include <desktop/app_install.h>
 #include <desktop/app_registry.h>
 
 #include <dirent.h>
@@ -26,7 +28,7 @@ static char **registry_dirs_get(void)
 	char *copy = strdup(env ? env : "");
 	if (!copy)
 		return NULL;
-	size_t n = 2;
+	size_t n = 3;
 	for (const char *p = copy; *p; p++)
 		n += *p == ':';
 	char **dirs = calloc(n + 1, sizeof(char *));
@@ -39,6 +41,10 @@ static char **registry_dirs_get(void)
 	for (char *tok = strtok_r(copy, ":", &save); tok; tok = strtok_r(NULL, ":", &save))
 		if (*tok)
 			dirs[i++] = strdup(tok);
+	/* An installed tree's own entries, then those of the build. */
+	char *installed = desktop_app_install_path_get("tizen-platform/apps");
+	if (installed)
+		dirs[i++] = installed;
 	dirs[i++] = strdup(TIZEN_APPS_DIR_DEFAULT);
 	free(copy);
 	return dirs;

@@ -1,4 +1,5 @@
 /* The floating button: a layout from the platform's own floatingbutton.edj whose stop is switched by signals. */
+#include <desktop/app_install.h>
 #include <efl_extension.h>
 
 #include <dlog.h>
@@ -51,10 +52,16 @@ static void __delCb(void *data, Evas *e, Evas_Object *obj, void *event_info)
 	free(data);
 }
 
+/* TIZEN_PLATFORM_DATA_DIR, else the installed tree's folder, else the build's. */
 static const char *__dataDir(void)
 {
 	const char *dir = getenv("TIZEN_PLATFORM_DATA_DIR");
-	return (dir && *dir) ? dir : TIZEN_PLATFORM_DATA_DIR;
+	if (dir && *dir)
+		return dir;
+	static char *installed;
+	if (!installed)
+		installed = desktop_app_install_path_get("tizen-platform/data");
+	return installed ? installed : TIZEN_PLATFORM_DATA_DIR;
 }
 
 Evas_Object *eext_floatingbutton_add(Evas_Object *parent)
