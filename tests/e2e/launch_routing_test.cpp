@@ -17,11 +17,7 @@ const std::string TEXT = " -d http://tizen.org/appcontrol/data/text ";
 const std::string QUICK = OP + "send_text_quickmemo -r" + TEXT;
 const char *const NEWEST = "SELECT title || '|' || content FROM memo WHERE isQuick = 0 ORDER BY _id DESC LIMIT 1";
 const char *const QUICK_CONTENT = "SELECT content FROM memo WHERE isQuick = 1";
-#if __has_include("View/MemoListView.h")
-const char *const LIST = "MemoListView";
-#else
-const char *const LIST = "MemoEditView"; // stands in for the list until it lands
-#endif
+const char *const LIST = memo_test::LIST_PAGE;
 
 TEST(LaunchRoutingTest, ColdStartsShowAndFillTheirPage)
 {
