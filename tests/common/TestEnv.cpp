@@ -3,6 +3,7 @@
 #include <Ecore.h>
 #include <Ecore_Evas.h>
 #include <Elementary.h>
+#include <sqlite3.h>
 
 #include <cstdio>
 #include <cstdlib>
@@ -129,5 +130,19 @@ std::string readFile(const std::string &path)
 	std::stringstream ss;
 	ss << in.rdbuf();
 	return ss.str();
+}
+
+std::string queryFirst(const std::string &dbPath, const std::string &sql)
+{
+	std::string result;
+	sqlite3 *db = nullptr;
+	sqlite3_stmt *stmt = nullptr;
+	if (sqlite3_open_v2(dbPath.c_str(), &db, SQLITE_OPEN_READWRITE, nullptr) == SQLITE_OK &&
+	    sqlite3_prepare_v2(db, sql.c_str(), -1, &stmt, nullptr) == SQLITE_OK && sqlite3_step(stmt) == SQLITE_ROW &&
+	    sqlite3_column_text(stmt, 0))
+		result = reinterpret_cast<const char *>(sqlite3_column_text(stmt, 0));
+	sqlite3_finalize(stmt);
+	sqlite3_close(db);
+	return result;
 }
 } // namespace memo_test

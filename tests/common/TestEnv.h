@@ -43,6 +43,10 @@ int runCommand(const std::string &cmd, std::string *out = nullptr);
 // Reads a whole file; empty when it cannot be read.
 std::string readFile(const std::string &path);
 
+// Runs one statement on a database file and returns the first column of its first row; empty when there is
+// none.
+std::string queryFirst(const std::string &dbPath, const std::string &sql);
+
 // How often `what` occurs in `text`, overlaps included.
 inline size_t countOf(const std::string &text, const std::string &what)
 {

@@ -2,8 +2,6 @@
 // shows its first screen (saved as PNG), ends by itself, and leaves memo.db with its schema.
 #include <gtest/gtest.h>
 
-#include <sqlite3.h>
-
 #include <string>
 
 #include "TestEnv.h"
@@ -26,20 +24,7 @@ protected:
 
 	std::string log() const { return memo_test::readFile(root + "/data/dlog.log"); }
 
-	// First column of the first row of a query on memo.db; empty when there is none.
-	std::string query(const char *sql) const
-	{
-		std::string result;
-		sqlite3 *db = nullptr;
-		sqlite3_stmt *stmt = nullptr;
-		if (sqlite3_open_v2((root + "/data/memo.db").c_str(), &db, SQLITE_OPEN_READONLY, nullptr) == SQLITE_OK &&
-		    sqlite3_prepare_v2(db, sql, -1, &stmt, nullptr) == SQLITE_OK && sqlite3_step(stmt) == SQLITE_ROW &&
-		    sqlite3_column_text(stmt, 0))
-			result = reinterpret_cast<const char *>(sqlite3_column_text(stmt, 0));
-		sqlite3_finalize(stmt);
-		sqlite3_close(db);
-		return result;
-	}
+	std::string query(const char *sql) const { return memo_test::queryFirst(root + "/data/memo.db", sql); }
 
 	std::string root;
 };

@@ -4,14 +4,12 @@
 
 #include <string>
 
-#include "TestEnv.h"
-#include "support/MemoLaunch.h"
-#include "support/X11Display.h"
+#include "support/E2e.h"
 
 TEST(EditorEndToEnd, TypedMemoIsSavedWhenTheLauncherEndsTheApp)
 {
 	memo_test::X11Display x11;
-	if (!x11.ok())
+	if (!x11.ok)
 		GTEST_SKIP() << "Xvfb, openbox and xdotool are needed";
 	memo_test::MemoLaunch app(x11.env());
 	ASSERT_EQ("MemoEditView", app.start("-o widget_new"));

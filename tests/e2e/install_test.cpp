@@ -5,8 +5,7 @@
 
 #include <string>
 
-#include "TestEnv.h"
-#include "support/MemoLaunch.h"
+#include "support/E2e.h"
 
 TEST(InstallTest, InstalledTreeStartsAndOpensAFileFromTheDesktop)
 {

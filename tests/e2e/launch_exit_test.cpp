@@ -5,13 +5,12 @@
 
 #include <string>
 
-#include "support/MemoLaunch.h"
-#include "support/X11Display.h"
+#include "support/E2e.h"
 
 TEST(LaunchExitTest, SingleJobStartsEndWithTheirPage)
 {
 	memo_test::X11Display x11;
-	if (!x11.ok())
+	if (!x11.ok)
 		GTEST_SKIP() << "Xvfb, openbox and xdotool are needed";
 	memo_test::MemoLaunch app(x11.env());
 	const std::string window = "search --sync --onlyvisible --classname '^com\\.veltron\\.memo$' ";

@@ -5,69 +5,53 @@
 #include <gtest/gtest.h>
 
 #include <string>
-#include <utility>
 
-#include "support/MemoLaunch.h"
-#include "TestEnv.h"
+#include "support/E2e.h"
 
 namespace
 {
-const std::string OP = "-o http://tizen.org/appcontrol/operation/";
-const std::string TEXT = " -d http://tizen.org/appcontrol/data/text ";
+const std::string OP = "-o http://tizen.org/appcontrol/operation/", SHARE = OP + "share ";
+const std::string SHARE_TEXT = OP + "share_text", TEXT = " -d http://tizen.org/appcontrol/data/text ";
 const std::string QUICK = OP + "send_text_quickmemo -r" + TEXT;
-const char *const NEWEST = "SELECT title || '|' || content FROM memo WHERE isQuick = 0 ORDER BY _id DESC LIMIT 1";
-const char *const QUICK_CONTENT = "SELECT content FROM memo WHERE isQuick = 1";
-const char *const LIST = memo_test::LIST_PAGE;
+const std::string LIST = memo_test::LIST_PAGE, EDIT = "MemoEditView";
+const char *const COUNT = "SELECT count(*) FROM memo";
 
 TEST(LaunchRoutingTest, ColdStartsShowAndFillTheirPage)
 {
 	memo_test::MemoLaunch app;
 	EXPECT_EQ(LIST, app.start(""));
 	ASSERT_TRUE(app.end());
+	const char *quickState = "SELECT UUID || ' ' || lastModifiedAt FROM memo WHERE isQuick = 1";
+	const std::string quick = app.query(quickState), dir = memo_test::makeTempDir("shared");
+	memo_test::runCommand("cd '" + dir +
+	                      "' && printf 'first\\nsecond & last' >notes.md && cp '" TEST_SOURCE_DIR
+	                      "/res/icons/hicolor/16x16/apps/com.veltron.memo.png' Shot.PNG");
 
-	EXPECT_EQ("MemoEditView", app.start(OP + "share_text -d http://tizen.org/appcontrol/data/subject 'Salt & pepper'" +
-	                                    TEXT + "'milk & eggs'"));
-	ASSERT_TRUE(app.end());
-	EXPECT_EQ("Salt & pepper|milk & eggs", app.query(NEWEST));
-	const std::string saved = app.query("SELECT UUID || ' ' || lastModifiedAt FROM memo WHERE _id = 2");
-
-	for (size_t length : {5000, 4096}) {
-		app.start(OP + "share_text" + TEXT + std::string(length, 'x'));
+	// The request, its first page, a line of its log, and the memo saved when the app ends ("" for none).
+	const std::string rows[][4] = {
+	    {SHARE_TEXT + " -d http://tizen.org/appcontrol/data/subject 'Salt & pepper'" + TEXT + "'milk & eggs'", EDIT, "",
+	     "Salt & pepper|milk & eggs"},
+	    {SHARE_TEXT + TEXT + std::string(5000, 'x'), EDIT, "", "|" + std::string(4096, 'x')},
+	    {SHARE_TEXT + TEXT + std::string(4096, 'x'), EDIT, "", "|" + std::string(4096, 'x')},
+	    {SHARE + "-m text/plain -u 'file://" + dir + "/notes.md'", EDIT, "", "|first\nsecond & last"},
+	    {SHARE + "-u 'file://" + dir + "/Shot.PNG'", EDIT, "image " + dir + "/Shot.PNG", ""},
+	    {SHARE + "-u file:///no/file", EDIT, "File open failed.", ""},
+	    {SHARE + "-u abc", EDIT, "not a file URI", ""},
+	    {"-o widget_new", EDIT, "", ""},
+	    {"-o widget_open -d uuid " + quick.substr(0, quick.find(' ')), EDIT, "", ""},
+	    {"-o widget_open -d uuid no-such-uuid", EDIT, "", ""},
+	    {"-o widget_open", LIST, "", ""},
+	};
+	for (const auto &row : rows) {
+		const std::string count = app.query(COUNT);
+		EXPECT_EQ(row[1], app.start(row[0])) << row[0];
+		EXPECT_NE(std::string::npos, app.log().find(row[2])) << row[0];
 		ASSERT_TRUE(app.end());
-		EXPECT_EQ("4096", app.query("SELECT length(content) FROM memo ORDER BY _id DESC LIMIT 1"));
+		const char *newest = "SELECT title || '|' || content FROM memo WHERE isQuick = 0 ORDER BY _id DESC LIMIT 1";
+		EXPECT_EQ(row[3].empty() ? count : row[3], app.query(row[3].empty() ? COUNT : newest)) << row[0];
 	}
-
-	const std::string notes = memo_test::makeTempDir("shared") + "/notes.md";
-	memo_test::runCommand("printf 'first\\nsecond & last' > '" + notes + "'");
-	app.start(OP + "share -m text/plain -u 'file://" + notes + "'");
-	ASSERT_TRUE(app.end());
-	EXPECT_EQ("|first\nsecond & last", app.query(NEWEST));
-
-	// A picture goes in as a picture; a missing file and a URI that is no file URI give an empty memo.
-	const std::string count = app.query("SELECT count(*) FROM memo");
-	const std::string picture = memo_test::makeTempDir("picture") + "/Shot.PNG";
-	memo_test::runCommand("cp '" TEST_SOURCE_DIR "/res/icons/hicolor/16x16/apps/com.veltron.memo.png' '" + picture +
-	                      "'");
-	const std::pair<std::string, std::string> shares[] = {
-	    {"file://" + picture, "image " + picture}, {"file:///no/file", "File open failed."}, {"abc", "not a file URI"}};
-	for (const auto &share : shares) {
-		EXPECT_EQ("MemoEditView", app.start(OP + "share -u '" + share.first + "'"));
-		EXPECT_NE(std::string::npos, app.log().find(share.second)) << share.first;
-		ASSERT_TRUE(app.end());
-	}
-	EXPECT_EQ(count, app.query("SELECT count(*) FROM memo"));
-
-	// The widget: a new memo, a stored one read only (nothing written at the end), an unknown one empty.
-	EXPECT_EQ("MemoEditView", app.start("-o widget_new"));
-	ASSERT_TRUE(app.end());
-	for (const std::string &uuid : {saved.substr(0, saved.find(' ')), std::string("no-such-uuid")}) {
-		EXPECT_EQ("MemoEditView", app.start("-o widget_open -d uuid " + uuid));
-		ASSERT_TRUE(app.end());
-	}
-	EXPECT_EQ(count, app.query("SELECT count(*) FROM memo"));
-	EXPECT_EQ(saved, app.query("SELECT UUID || ' ' || lastModifiedAt FROM memo WHERE _id = 2"));
-	EXPECT_EQ(LIST, app.start("-o widget_open"));
-	ASSERT_TRUE(app.end());
+	// The quick memo was opened read only: nothing of it was written.
+	EXPECT_EQ(quick, app.query(quickState));
 }
 
 TEST(LaunchRoutingTest, RunningAppKeepsItsPageAndTakesQuickMemoText)
@@ -76,16 +60,17 @@ TEST(LaunchRoutingTest, RunningAppKeepsItsPageAndTakesQuickMemoText)
 	std::string reply;
 	EXPECT_EQ(LIST, app.start(QUICK + "'buy bread'", &reply));
 	EXPECT_NE(std::string::npos, reply.find("result=succeeded"));
-	EXPECT_EQ("buy bread", app.query(QUICK_CONTENT));
+	const char *quickContent = "SELECT content FROM memo WHERE isQuick = 1";
+	EXPECT_EQ("buy bread", app.query(quickContent));
 	ASSERT_TRUE(app.end());
 
 	// With another memo open the text goes to the store and the editor stays as it was.
-	EXPECT_EQ("MemoEditView", app.start("-o widget_new"));
-	EXPECT_EQ(0, app.send(OP + "share_text" + TEXT + "'not for this page'"));
+	EXPECT_EQ(EDIT, app.start("-o widget_new"));
+	EXPECT_EQ(0, app.send(SHARE_TEXT + TEXT + "'not for this page'"));
 	EXPECT_EQ(0, app.send(QUICK + "'call mum'"));
-	EXPECT_EQ("buy bread\ncall mum", app.query(QUICK_CONTENT));
+	EXPECT_EQ("buy bread\ncall mum", app.query(quickContent));
 	EXPECT_EQ(1u, memo_test::countOf(app.log(), "first page:"));
 	ASSERT_TRUE(app.end());
-	EXPECT_EQ("1", app.query("SELECT count(*) FROM memo"));
+	EXPECT_EQ("1", app.query(COUNT));
 }
 } // namespace

@@ -7,7 +7,6 @@
 #include <Ecore_File.h>
 #include <app_preference.h>
 #include <clocale>
-#include <sqlite3.h>
 #include <unistd.h>
 #include <vconf.h>
 
@@ -25,6 +24,7 @@
 #include "Model/MemoPopupMonitor.h"
 #include "Util/MemoUtil.h"
 #include "View/MemoEditView.h"
+#include "TestEnv.h"
 #include "UiTestSupport.h"
 
 namespace memo_ui_test
@@ -171,17 +171,7 @@ protected:
 	// First column of the first row of a query on memo.db; "" when there is none.
 	static std::string query(const std::string &sql)
 	{
-		std::string result;
-		sqlite3 *db = nullptr;
-		sqlite3_stmt *stmt = nullptr;
-		const std::string path = std::string(MemoUtil::getDataPath()) + "memo.db";
-		if (sqlite3_open_v2(path.c_str(), &db, SQLITE_OPEN_READWRITE, nullptr) == SQLITE_OK &&
-		    sqlite3_prepare_v2(db, sql.c_str(), -1, &stmt, nullptr) == SQLITE_OK && sqlite3_step(stmt) == SQLITE_ROW &&
-		    sqlite3_column_text(stmt, 0))
-			result = reinterpret_cast<const char *>(sqlite3_column_text(stmt, 0));
-		sqlite3_finalize(stmt);
-		sqlite3_close(db);
-		return result;
+		return memo_test::queryFirst(std::string(MemoUtil::getDataPath()) + "memo.db", sql);
 	}
 	// From now on every insert or update of a memo row is counted in memoWrites().
 	static void countWrites()
