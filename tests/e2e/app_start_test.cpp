@@ -4,47 +4,31 @@
 
 #include <string>
 
-#include "TestEnv.h"
+#include "support/E2e.h"
 
-namespace
+TEST(AppStartTest, firstStartOnAnEmptyFolderThenAgainOnTheSameFolder)
 {
-
-class AppStartTest : public ::testing::Test
-{
-protected:
-	void SetUp() override { root = memo_test::makeTempDir("memo-app"); }
-
+	memo_test::MemoLaunch app;
 	// Runs the app headless until its first screen is saved as a PNG; true when both happened.
-	bool runApp(const std::string &png)
-	{
-		std::string cmd = "TIZEN_APP_ROOT='" + root + "' TIZEN_SCREENSHOT='" + png +
-		                  "' TIZEN_SCREENSHOT_EXIT=1 timeout 60 '" MEMO_BIN "' >/dev/null 2>&1";
-		return memo_test::runCommand(cmd) == 0 && memo_test::readFile(png).substr(0, 4) == "\x89PNG";
-	}
-
-	std::string log() const { return memo_test::readFile(root + "/data/dlog.log"); }
-
-	std::string query(const char *sql) const { return memo_test::queryFirst(root + "/data/memo.db", sql); }
-
-	std::string root;
-};
-
-TEST_F(AppStartTest, firstStartOnAnEmptyFolderThenAgainOnTheSameFolder)
-{
+	auto runApp = [&app](const std::string &png) {
+		return memo_test::runCommand(app.env + "TIZEN_SCREENSHOT='" + png +
+		                             "' TIZEN_SCREENSHOT_EXIT=1 timeout 60 '" MEMO_BIN "' >/dev/null 2>&1") == 0 &&
+		       memo_test::readFile(png).substr(0, 4) == "\x89PNG";
+	};
 	const char *objects = "SELECT group_concat(type || ' ' || name, ',') FROM (SELECT type, name FROM sqlite_master "
 	                      "WHERE name NOT LIKE 'sqlite_%' ORDER BY rowid)";
 	const char *everything = "SELECT group_concat(sql, ';') || (SELECT count(*) FROM memo) FROM sqlite_master";
-	ASSERT_TRUE(runApp(root + "/first.png"));
+	ASSERT_TRUE(runApp(app.root + "/first.png"));
 	EXPECT_EQ("table memo,table category,table file,table android_metadata,table password,trigger delete_file",
-	          query(objects));
+	          app.query(objects));
 	// The columns as the sync service knows them, spelling included.
 	EXPECT_NE(
 	    std::string::npos,
-	    query("SELECT sql FROM sqlite_master WHERE name = 'memo'").find("isFavorite INTERGER NOT NULL DEFAULT 0"));
-	std::string firstState = query(everything);
+	    app.query("SELECT sql FROM sqlite_master WHERE name = 'memo'").find("isFavorite INTERGER NOT NULL DEFAULT 0"));
+	std::string firstState = app.query(everything);
 
 	// The lifecycle in order, and the first-run defaults written once.
-	std::string firstLog = log();
+	std::string firstLog = app.log();
 	size_t at = 0;
 	for (const char *step : {"> onCreate", "First run: writing the preference defaults", "> onAppControl",
 	                         "> onTerminate", "> ~MemoApp"}) {
@@ -53,11 +37,9 @@ TEST_F(AppStartTest, firstStartOnAnEmptyFolderThenAgainOnTheSameFolder)
 	}
 
 	// The second start finds everything in place and changes nothing of it.
-	ASSERT_TRUE(runApp(root + "/second.png"));
-	EXPECT_EQ(firstState, query(everything));
-	std::string secondLog = log().substr(firstLog.size());
+	ASSERT_TRUE(runApp(app.root + "/second.png"));
+	EXPECT_EQ(firstState, app.query(everything));
+	std::string secondLog = app.log().substr(firstLog.size());
 	EXPECT_NE(secondLog.find("> ~MemoApp"), std::string::npos);
 	EXPECT_EQ(secondLog.find("First run"), std::string::npos);
 }
-
-} // namespace

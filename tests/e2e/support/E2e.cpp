@@ -1,8 +1,6 @@
 #include "E2e.h"
 
 #include <signal.h>
-#include <sys/stat.h>
-#include <unistd.h>
 
 namespace memo_test
 {
@@ -40,11 +38,13 @@ X11Display::X11Display()
 {
 	if (runCommand("command -v Xvfb && command -v openbox && command -v xdotool") != 0)
 		return;
-	struct stat st;
-	for (display = 60 + getpid() % 30; stat(("/tmp/.X11-unix/X" + std::to_string(display)).c_str(), &st) == 0;)
-		display++;
-	xvfb = startInBackground("Xvfb :" + std::to_string(display) + " -screen 0 1024x900x24 -nolisten tcp");
-	ok = pump(10.0, [this] { return xdotool("getmouselocation >/dev/null 2>&1") == 0; });
+	// Xvfb picks a free display itself and names it once it takes connections.
+	const std::string number = makeTempDir("x11") + "/display";
+	xvfb = startInBackground("Xvfb -displayfd 3 -screen 0 1024x900x24 -nolisten tcp 3>'" + number + "'");
+	ok = pump(10.0, [&] {
+		display = atoi(readFile(number).c_str());
+		return readFile(number).find('\n') != std::string::npos;
+	});
 	if (ok)
 		openbox = startInBackground(env() + "openbox");
 }
@@ -64,6 +64,6 @@ std::string X11Display::env() const
 
 int X11Display::xdotool(const std::string &args) const
 {
-	return runCommand("DISPLAY=:" + std::to_string(display) + " xdotool " + args);
+	return runCommand("DISPLAY=:" + std::to_string(display) + " timeout 30 xdotool " + args);
 }
 } // namespace memo_test
