@@ -16,12 +16,10 @@
 
 /* A sent request that waits for its reply on its own connection. */
 typedef struct {
-	app_message_reader_s *reader;
 	int ref;
 	app_control_h request;
 	app_control_reply_cb callback;
 	void *user_data;
-	bool answered;
 } pending_reply_s;
 
 static int last_ref;
@@ -44,7 +42,6 @@ static void pending_answer(pending_reply_s *p, app_control_h reply, app_control_
 	app_control_h empty = NULL;
 	if (!reply && app_control_create(&empty) == APP_CONTROL_ERROR_NONE)
 		reply = empty;
-	p->answered = true;
 	if (p->callback)
 		p->callback(p->request, reply, result, p->user_data);
 	if (empty)
@@ -61,15 +58,12 @@ static void reply_message_cb(void *data, app_message_reader_s *reader, const app
 {
 	pending_reply_s *p = data;
 	if (!msg) {
-		/* The callee closed the connection: after its reply, or instead of one. */
-		if (!p->answered) {
-			LOGI("the callee closed the request without replying");
-			pending_answer(p, NULL, APP_CONTROL_RESULT_CANCELED);
-		}
+		LOGI("the callee closed the request without replying");
+		pending_answer(p, NULL, APP_CONTROL_RESULT_CANCELED);
 		pending_free(p);
 		return;
 	}
-	if (msg->major != APP_CHANNEL_MSG_REPLY || msg->ref != p->ref || p->answered)
+	if (msg->major != APP_CHANNEL_MSG_REPLY || msg->ref != p->ref)
 		return;
 	app_control_h reply = msg->size > 0 ? app_control_decode_internal(msg->data, msg->size) : NULL;
 	if (msg->size > 0 && !reply)
@@ -77,6 +71,7 @@ static void reply_message_cb(void *data, app_message_reader_s *reader, const app
 	pending_answer(p, reply, (app_control_result_e)msg->response);
 	if (reply)
 		app_control_destroy(reply);
+	/* One reply per request: the connection ends here, and with it this call's last use of p. */
 	app_message_reader_del(reader);
 	pending_free(p);
 }
@@ -194,9 +189,9 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 		p->ref = ref;
 		p->callback = callback;
 		p->user_data = user_data;
-		p->reader = app_message_reader_add(fd, true, reply_message_cb, p);
+		app_message_reader_s *reader = app_message_reader_add(fd, true, reply_message_cb, p);
 		fd = -1;
-		if (!p->reader) {
+		if (!reader) {
 			pending_free(p);
 			ret = launch_error(APP_CONTROL_ERROR_OUT_OF_MEMORY, "cannot wait for the reply", app_id);
 		}

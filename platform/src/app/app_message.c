@@ -57,17 +57,23 @@ static int write_all(int fd, const void *buf, size_t size, double end)
 		}
 		if (n < 0 && errno == EINTR)
 			continue;
-		if (n < 0 && errno != EAGAIN && errno != EWOULDBLOCK)
+		if (n < 0 && errno != EAGAIN && errno != EWOULDBLOCK) {
+			LOGE("the receiver is gone (%s)", strerror(errno));
 			return APP_CONTROL_ERROR_IO_ERROR;
+		}
 		double left = end - monotonic_now();
 		if (left <= 0)
 			return APP_CONTROL_ERROR_TIMED_OUT;
 		struct pollfd pfd = {fd, POLLOUT, 0};
 		int r = poll(&pfd, 1, (int)(left * 1000) + 1);
-		if (r < 0 && errno != EINTR)
+		if (r < 0 && errno != EINTR) {
+			LOGE("cannot wait for the receiver (%s)", strerror(errno));
 			return APP_CONTROL_ERROR_IO_ERROR;
-		if (r > 0 && (pfd.revents & (POLLERR | POLLHUP)))
+		}
+		if (r > 0 && (pfd.revents & (POLLERR | POLLHUP))) {
+			LOGE("the receiver is gone");
 			return APP_CONTROL_ERROR_IO_ERROR;
+		}
 	}
 	return APP_CONTROL_ERROR_NONE;
 }
@@ -83,8 +89,6 @@ int app_message_send(int fd, const app_message_s *msg, double timeout_sec)
 		ret = write_all(fd, msg->data, (size_t)msg->size, end);
 	if (ret == APP_CONTROL_ERROR_TIMED_OUT)
 		LOGE("the receiver took no message for %.1f s: stopped or busy", timeout_sec);
-	else if (ret != APP_CONTROL_ERROR_NONE)
-		LOGE("the receiver is gone (%s)", strerror(errno));
 	return ret;
 }
 
@@ -129,11 +133,12 @@ static bool reader_fill(app_message_reader_s *r)
 {
 	for (;;) {
 		if (r->cap - r->len < READ_CHUNK) {
-			unsigned char *grown = realloc(r->buf, r->cap + READ_CHUNK);
+			size_t cap = r->cap ? r->cap * 2 : READ_CHUNK;
+			unsigned char *grown = realloc(r->buf, cap);
 			if (!grown)
 				return false;
 			r->buf = grown;
-			r->cap += READ_CHUNK;
+			r->cap = cap;
 		}
 		ssize_t n = recv(r->fd, r->buf + r->len, r->cap - r->len, MSG_DONTWAIT);
 		if (n > 0) {

@@ -6,9 +6,9 @@
 
 #include <dlog.h>
 #include <stdio.h>
-#include <sys/socket.h>
 #include <stdlib.h>
 #include <string.h>
+#include <sys/socket.h>
 #include <unistd.h>
 
 /* A connection from another app; token is set while a request received on it waits for its reply. */
@@ -45,8 +45,10 @@ static void client_forget(client_s *c)
 
 static void client_close(client_s *c)
 {
-	app_message_reader_del(c->reader);
+	app_message_reader_s *reader = c->reader;
+	/* The watch goes before the socket it watches is closed. */
 	client_forget(c);
+	app_message_reader_del(reader);
 }
 
 static void on_launch(client_s *c, const app_message_s *msg)
