@@ -169,7 +169,8 @@ static int terminate_app(const char *app_id)
 	int ret = app_control_send_terminate_request(request);
 	app_control_destroy(request);
 	if (ret != APP_CONTROL_ERROR_NONE) {
-		fprintf(stderr, "app_launcher: %s is not running\n", app_id);
+		fprintf(stderr, "app_launcher: %s: %s\n", app_id,
+		        ret == APP_CONTROL_ERROR_APP_NOT_FOUND ? "not running" : error_text(ret));
 		return EXIT_FAILED;
 	}
 	printf("asked %s to end\n", app_id);
