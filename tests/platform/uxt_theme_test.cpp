@@ -90,6 +90,11 @@ TEST_F(UxtTheme, ColorTableSetsColourClassesThatObjectsReportBack)
 	EXPECT_EQ(10, r);
 	EXPECT_EQ(250, globalColor("UXT_TEST_B011").r);
 	evas_object_del(win);
+
+	// Missing table files, and tables of the other kind, are refused.
+	EXPECT_EQ(nullptr, uxt_theme_add_color_table("/nonexistent/table.xml"));
+	EXPECT_EQ(nullptr, uxt_theme_add_color_table(kFontTable.c_str()));
+	EXPECT_EQ(nullptr, uxt_theme_add_font_table(kColorTable.c_str()));
 }
 
 TEST_F(UxtTheme, ThemeKeyChangeReappliesTheTableAndFiresColourCallbacks)
@@ -135,12 +140,5 @@ TEST_F(UxtTheme, FontTableFollowsTheFontSizeKeyUnlessFixed)
 	ASSERT_TRUE(edje_text_class_get("UXT_TEST_T012", &font, &size));
 	EXPECT_STREQ("Serif:style=Regular", font);
 	EXPECT_EQ(30, size);
-}
-
-TEST_F(UxtTheme, MissingOrWrongTableFilesAreRejected)
-{
-	EXPECT_EQ(nullptr, uxt_theme_add_color_table("/nonexistent/table.xml"));
-	EXPECT_EQ(nullptr, uxt_theme_add_color_table(kFontTable.c_str()));
-	EXPECT_EQ(nullptr, uxt_theme_add_font_table(kColorTable.c_str()));
 }
 } // namespace
