@@ -53,16 +53,16 @@ protected:
 	}
 
 	// A control in `mode` on `record`, whose body becomes `lines` (todolist items); a second call
-	// within one test starts on a fresh window.
+	// within one test replaces the control.
 	MemoBoxControl *withBody(const std::string &lines, int mode = MODE_UPDATE);
 
-	// A fresh window and control, for a second set-up within one test.
+	// A fresh control in the same window, for a second set-up within one test.
 	MemoBoxControl *remakeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
 	{
-		UiFixture::TearDown();
-		UiFixture::SetUp();
+		control->destroy();
 		keys.clear();
 		payloads.clear();
+		clearToasts();
 		return makeControl(doc, mode, uuid);
 	}
 
@@ -111,6 +111,34 @@ protected:
 
 	std::string lastKey() const { return keys.empty() ? "" : keys.back(); }
 
+	std::string titleText() const
+	{
+		char *t = control->getTitleTextN();
+		std::string result = t ? t : "<null>";
+		free(t);
+		return result;
+	}
+
+	// The kinds and texts of the body items, e.g. "5:l1 1:l2 0:l3".
+	std::string shape() const
+	{
+		std::string out;
+		for (MemoBoxItem *item : items())
+			out += (out.empty() ? "" : " ") + std::to_string(item->getType()) + ":" + text(item);
+		return out;
+	}
+
+	// Focuses the item's entry and puts the cursor at `pos` (-1: the end).
+	void focusAt(MemoBoxItem *item, int pos = -1)
+	{
+		focus(item->getEntry());
+		if (pos < 0)
+			elm_entry_cursor_end_set(item->getEntry());
+		else
+			elm_entry_cursor_pos_set(item->getEntry(), pos);
+		runFor(0.03);
+	}
+
 	// The memo's media folder, made.
 	static std::string mediaDir(const char *uuid = "box-test-memo")
 	{
@@ -119,17 +147,28 @@ protected:
 		return dir;
 	}
 
+	// A picture of w x h in the memo's media folder.
+	static std::string picture(const char *name, int w = 1000, int h = 500)
+	{
+		const std::string path = mediaDir() + name;
+		EXPECT_TRUE(writePicture(path, w, h));
+		return path;
+	}
+
 	MemoBoxControl *control = nullptr;
 	MemoDocInfo record;
 	std::vector<std::string> keys;
 	std::vector<std::string> payloads;
 };
 
-// One todolist line as the store keeps it.
-inline std::string todoItem(int type, bool state, const std::string &escapedContent)
+// One todolist line as the store keeps it, for an item holding `markup`.
+inline std::string todoItem(int type, bool state, const std::string &markup)
 {
+	std::string content;
+	for (char c : markup)
+		content += c == '<' ? "&lt;" : c == '>' ? "&gt;" : c == '&' ? "&amp;" : c == '"' ? "&quot;" : std::string(1, c);
 	return std::string("<todolist_item todo_item_type=\"") + std::to_string(type) + "\" todo_item_state=\"" +
-	       (state ? "true" : "false") + "\" todo_item_content=\"" + escapedContent + "\"/>\n";
+	       (state ? "true" : "false") + "\" todo_item_content=\"" + content + "\"/>\n";
 }
 
 inline std::string todoList(const std::string &lines)
@@ -137,11 +176,10 @@ inline std::string todoList(const std::string &lines)
 	return "<todolist>\n" + lines + "</todolist>\n";
 }
 
-// A picture tag with its break, escaped as todolist content.
-inline std::string escapedTag(int w, int h, const std::string &path)
+// A picture tag as the editor writes it.
+inline std::string tag(int w, int h, const std::string &path)
 {
-	return "&lt;item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path +
-	       "&gt;&lt;/item&gt;&lt;br/&gt;";
+	return "<item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path + "></item>";
 }
 
 inline MemoBoxControl *BoxControlFixture::withBody(const std::string &lines, int mode)

@@ -4,6 +4,7 @@
 #include <Ecore_Evas.h>
 #include <desktop/toast_log.h>
 
+#include <cmath>
 #include <cstdint>
 
 #include "TestEnv.h"
@@ -173,6 +174,13 @@ void UiFixture::tap(int x, int y)
 	mouseUp(x, y);
 }
 
+void UiFixture::tapOn(Evas_Object *obj)
+{
+	int x = 0, y = 0;
+	centreOf(obj, &x, &y);
+	tap(x, y);
+}
+
 void UiFixture::centreOf(Evas_Object *obj, int *x, int *y)
 {
 	render();
@@ -195,30 +203,24 @@ bool UiFixture::screenshot(const std::string &pngPath)
 	return memo_test::saveScreenshot(win, pngPath);
 }
 
-bool writePicture(const std::string &path, int w, int h)
+bool writePicture(const std::string &path, int w, int h, uint32_t sky, uint32_t hill)
 {
 	Ecore_Evas *ee = ecore_evas_buffer_new(1, 1);
-	if (!ee)
+	Evas_Object *img = ee ? evas_object_image_add(ecore_evas_get(ee)) : nullptr;
+	if (!img)
 		return false;
-	Evas_Object *img = evas_object_image_add(ecore_evas_get(ee));
 	evas_object_image_size_set(img, w, h);
 	uint32_t *px = static_cast<uint32_t *>(evas_object_image_data_get(img, EINA_TRUE));
-	if (!px) {
-		ecore_evas_free(ee);
-		return false;
-	}
 	const int stride = evas_object_image_stride_get(img) / 4;
 	for (int y = 0; y < h; y++) {
 		for (int x = 0; x < w; x++) {
-			const bool frame = x < 4 || y < 4 || x >= w - 4 || y >= h - 4;
-			const uint32_t r = frame ? 60 : 120 + 100 * x / w;
-			const uint32_t g = frame ? 60 : 170 + 60 * y / h;
-			const uint32_t b = frame ? 60 : 220 - 60 * x / w;
-			px[y * stride + x] = 0xff000000u | (r << 16) | (g << 8) | b;
+			const bool ground = y > h * (0.62 + 0.08 * std::sin(x * 5.0 / w));
+			const uint32_t shade = ground ? 0 : static_cast<uint32_t>(50 * y / h) * 0x010100;
+			px[y * stride + x] = 0xff000000u | ((ground ? hill : sky) + shade);
 		}
 	}
 	evas_object_image_data_set(img, px);
-	const Eina_Bool ok = evas_object_image_save(img, path.c_str(), nullptr, "quality=90 compress=1");
+	const Eina_Bool ok = evas_object_image_save(img, path.c_str(), nullptr, "quality=92 compress=1");
 	ecore_evas_free(ee);
 	return ok;
 }

@@ -4,6 +4,7 @@
 // Scaffolding of the in-process UI tests: Elementary on the buffer engine with the app's theme, a
 // window holding a scroller and a vertical box, and real key and pointer events fed to its canvas.
 
+#include <cstdint>
 #include <functional>
 #include <string>
 
@@ -42,8 +43,9 @@ protected:
 	void mouseDown(int x, int y);
 	void mouseMove(int x, int y);
 	void mouseUp(int x, int y);
-	// Down and up at one point.
+	// Down and up at one point, or at the centre of an object.
 	void tap(int x, int y);
+	void tapOn(Evas_Object *obj);
 	// The centre of an object's geometry, after a render.
 	void centreOf(Evas_Object *obj, int *x, int *y);
 
@@ -61,9 +63,10 @@ private:
 	unsigned int __timestamp = 1000;
 };
 
-// Writes a picture of w x h to `path` in the format of its extension (.jpg, .png), a soft gradient with
-// a dark frame, through a throw-away buffer canvas. False when Evas cannot save it.
-bool writePicture(const std::string &path, int w, int h);
+// Writes a picture of w x h to `path` in the format of its extension (.jpg, .png) through a throw-away
+// buffer canvas: a small landscape, sky over a hill, so that screenshots show a picture and not a test
+// card. False when Evas cannot save it.
+bool writePicture(const std::string &path, int w, int h, uint32_t sky = 0x7fb6e0, uint32_t hill = 0x3f7a4a);
 
 // The messages posted as toasts since the last clearToasts().
 int toastCount();
