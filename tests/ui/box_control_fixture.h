@@ -18,6 +18,27 @@
 namespace memo_ui_test
 {
 
+// One todolist line as the store keeps it, for an item holding `markup`.
+inline std::string todoItem(int type, bool state, const std::string &markup)
+{
+	std::string content;
+	for (char c : markup)
+		content += c == '<' ? "&lt;" : c == '>' ? "&gt;" : c == '&' ? "&amp;" : c == '"' ? "&quot;" : std::string(1, c);
+	return std::string("<todolist_item todo_item_type=\"") + std::to_string(type) + "\" todo_item_state=\"" +
+	       (state ? "true" : "false") + "\" todo_item_content=\"" + content + "\"/>\n";
+}
+
+inline std::string todoList(const std::string &lines)
+{
+	return "<todolist>\n" + lines + "</todolist>\n";
+}
+
+// A picture tag as the editor writes it.
+inline std::string tag(int w, int h, const std::string &path)
+{
+	return "<item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path + "></item>";
+}
+
 class BoxControlFixture : public UiFixture
 {
 protected:
@@ -36,12 +57,11 @@ protected:
 		elm_config_scale_set(1.0);
 	}
 
-	// Builds a control for `doc` (may be null) in `mode`; it replaces the fixture's own box.
+	// Builds a control for `doc` (may be null) in `mode`, as the scroller's content.
 	MemoBoxControl *makeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
 	{
 		control = new MemoBoxControl(doc, mode, uuid);
 		EXPECT_TRUE(control->create(scroller, nullptr));
-		box = nullptr;
 		control->getSignal().addListener([this](const char *key, void *payload) {
 			keys.push_back(key);
 			payloads.push_back(payload && strcmp(key, "action,image,selected") == 0 ? static_cast<char *>(payload)
@@ -54,7 +74,12 @@ protected:
 
 	// A control in `mode` on `record`, whose body becomes `lines` (todolist items); a second call
 	// within one test replaces the control.
-	MemoBoxControl *withBody(const std::string &lines, int mode = MODE_UPDATE);
+	MemoBoxControl *withBody(const std::string &lines, int mode = MODE_UPDATE)
+	{
+		record.setMemoUUID("box-test-memo");
+		record.setTizenXmlContent(todoList(lines).c_str());
+		return control ? remakeControl(&record, mode) : makeControl(&record, mode);
+	}
 
 	// A fresh control in the same window, for a second set-up within one test.
 	MemoBoxControl *remakeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
@@ -160,34 +185,6 @@ protected:
 	std::vector<std::string> keys;
 	std::vector<std::string> payloads;
 };
-
-// One todolist line as the store keeps it, for an item holding `markup`.
-inline std::string todoItem(int type, bool state, const std::string &markup)
-{
-	std::string content;
-	for (char c : markup)
-		content += c == '<' ? "&lt;" : c == '>' ? "&gt;" : c == '&' ? "&amp;" : c == '"' ? "&quot;" : std::string(1, c);
-	return std::string("<todolist_item todo_item_type=\"") + std::to_string(type) + "\" todo_item_state=\"" +
-	       (state ? "true" : "false") + "\" todo_item_content=\"" + content + "\"/>\n";
-}
-
-inline std::string todoList(const std::string &lines)
-{
-	return "<todolist>\n" + lines + "</todolist>\n";
-}
-
-// A picture tag as the editor writes it.
-inline std::string tag(int w, int h, const std::string &path)
-{
-	return "<item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path + "></item>";
-}
-
-inline MemoBoxControl *BoxControlFixture::withBody(const std::string &lines, int mode)
-{
-	record.setMemoUUID("box-test-memo");
-	record.setTizenXmlContent(todoList(lines).c_str());
-	return control ? remakeControl(&record, mode) : makeControl(&record, mode);
-}
 
 } // namespace memo_ui_test
 

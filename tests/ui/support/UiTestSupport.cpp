@@ -46,12 +46,6 @@ void UiFixture::SetUp()
 	elm_win_resize_object_add(win, scroller);
 	evas_object_show(scroller);
 
-	box = elm_box_add(scroller);
-	evas_object_size_hint_weight_set(box, EVAS_HINT_EXPAND, 0.0);
-	evas_object_size_hint_align_set(box, EVAS_HINT_FILL, 0.0);
-	elm_object_content_set(scroller, box);
-	evas_object_show(box);
-
 	evas_object_resize(win, 720, 1280);
 	evas_object_show(win);
 	elm_win_activate(win);
@@ -67,7 +61,7 @@ void UiFixture::TearDown()
 {
 	if (win)
 		evas_object_del(win);
-	win = scroller = box = nullptr;
+	win = scroller = nullptr;
 	runFor(0.02);
 }
 
@@ -152,12 +146,6 @@ void UiFixture::mouseDown(int x, int y)
 {
 	evas_event_feed_mouse_move(evas(), x, y, ++__timestamp, nullptr);
 	evas_event_feed_mouse_down(evas(), 1, EVAS_BUTTON_NONE, ++__timestamp, nullptr);
-	runFor(0.02);
-}
-
-void UiFixture::mouseMove(int x, int y)
-{
-	evas_event_feed_mouse_move(evas(), x, y, ++__timestamp, nullptr);
 	runFor(0.02);
 }
 

@@ -2,7 +2,7 @@
 #define TESTS_UI_SUPPORT_UITESTSUPPORT_H
 
 // Scaffolding of the in-process UI tests: Elementary on the buffer engine with the app's theme, a
-// window holding a scroller and a vertical box, and real key and pointer events fed to its canvas.
+// window holding a scroller, and real key and pointer events fed to its canvas.
 
 #include <cstdint>
 #include <functional>
@@ -17,7 +17,7 @@ namespace memo_ui_test
 // Elementary and the app's theme, once per process. Safe to call again.
 void initUi();
 
-// A window of 720 x 1280 with a background, a scroller and a vertical box (`box`) in it.
+// A window of 720 x 1280 with a background and a scroller.
 class UiFixture : public ::testing::Test
 {
 protected:
@@ -41,7 +41,6 @@ protected:
 
 	// Pointer events at canvas coordinates; each lets the handlers run.
 	void mouseDown(int x, int y);
-	void mouseMove(int x, int y);
 	void mouseUp(int x, int y);
 	// Down and up at one point, or at the centre of an object.
 	void tap(int x, int y);
@@ -57,7 +56,6 @@ protected:
 
 	Evas_Object *win = nullptr;
 	Evas_Object *scroller = nullptr;
-	Evas_Object *box = nullptr;
 
 private:
 	unsigned int __timestamp = 1000;
