@@ -1,10 +1,9 @@
-// The converter's stored forms, the quick memo append, and its behaviour on bad input.
+// The converter's stored forms, the quick memo append, and a huge item.
 #include "MemoCvt.h"
 #include "TestEnv.h"
 #include "todolist_fixture.h"
 
 #include <gtest/gtest.h>
-#include <libxml/parser.h>
 
 #include <cstdlib>
 #include <string>
@@ -14,20 +13,6 @@ using namespace todolist_test;
 
 namespace
 {
-// True when the document is well-formed XML.
-bool wellFormed(const std::string &xml)
-{
-	xmlDocPtr doc = xmlReadMemory(xml.data(), static_cast<int>(xml.size()), nullptr, nullptr,
-	                              XML_PARSE_NONET | XML_PARSE_NOERROR | XML_PARSE_NOWARNING);
-	xmlFreeDoc(doc);
-	return doc != nullptr;
-}
-
-bool isValidUtf8(const std::string &s)
-{
-	return xmlCheckUTF8(reinterpret_cast<const unsigned char *>(s.c_str())) && s.find('\0') == std::string::npos;
-}
-
 // The quick memo append as the store runs it against the stored document.
 std::string quickDocument(std::string stored, const std::string &text)
 {
@@ -109,10 +94,6 @@ TEST(MemoCvtQuickMemo, EachTextOnceInOrderWhateverItHolds)
 	EXPECT_EQ(1u, memo_test::countOf(cvt.getStrippedContent(), "say \"hi\""));
 	EXPECT_EQ(1u, memo_test::countOf(cvt.getStrippedContent(), "two & \"more\""));
 
-	// An empty text adds an empty item.
-	items = parse(quickAppend(stored, ""));
-	ASSERT_EQ(3u, items.size());
-	EXPECT_EQ("", items[2].content);
 	// Content behind the first root is no part of the body, and the text is there once.
 	items = parse(quickAppend(stored + "<todolist>\n</todolist>\n", "c"));
 	ASSERT_EQ(3u, items.size());
@@ -126,28 +107,10 @@ TEST(MemoCvtQuickMemo, EachTextOnceInOrderWhateverItHolds)
 	EXPECT_EQ("z", items[2].content);
 }
 
-TEST(MemoCvtRobustness, MalformedAndHugeInputGivesValidForms)
+// Malformed documents are the fuzz target's: its corpus holds the known ones, each checked for valid text
+// and well-formed documents on every fuzz run.
+TEST(MemoCvtRobustness, HugeItemGivesEveryForm)
 {
-	const std::vector<std::string> inputs = {
-	    "<todolist",
-	    "<<<>>>&&&;;",
-	    "\xff\xfe\x00x",
-	    std::string("<todolist>\n<todolist_item todo_item_type=\"0\" todo_item_content=\"a\0b\"/>", 60),
-	    "<!DOCTYPE t [<!ENTITY a \"aaaaaaaaaa\"><!ENTITY b \"&a;&a;&a;&a;\">]><todolist/>",
-	    "<todolist><todolist_item todo_item_type=\"1\" todo_item_state=\"false\" "
-	    "todo_item_content=\"\xff\xc3 &#1; &amp;#0; &amp;#xD800; &lt;item href=&lt;br\"/></todolist>",
-	    "<todolist><todolist_item todo_item_type=\"0\" todo_item_content=\"say \"hi\"\"/></todolist>",
-	    "<todolist>" + std::string(300, '<') + "</todolist>",
-	};
-	for (const std::string &input : inputs) {
-		MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, input);
-		for (const std::string &text : {cvt.getDisplayContent(), cvt.getStrippedContent(), cvt.getContent()})
-			EXPECT_TRUE(isValidUtf8(text)) << input;
-		EXPECT_TRUE(wellFormed(cvt.getXmlContent())) << input;
-		const std::string tizen = cvt.getTizenXmlContent();
-		EXPECT_TRUE(tizen.empty() || wellFormed(tizen)) << input;
-	}
-
 	// An item bigger than the editor ever stores, so made by hand.
 	const std::string big(2 * 1024 * 1024, 'w');
 	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, "<todolist><todolist_item todo_item_type=\"0\" todo_item_content=\"" + big +
