@@ -9,7 +9,6 @@ using StoreQuick = StoreTest;
 
 TEST_F(StoreQuick, AppendedTextsKeepTheirOrderAndNothingBreaksTheMemo)
 {
-	ASSERT_NE(nullptr, db());
 	db()->excuteSql("UPDATE memo SET lastModifiedAt = 1000 WHERE isQuick = 1");
 	vconf_set_int("db/memo/data-change", 0);
 
@@ -47,7 +46,6 @@ TEST_F(StoreQuick, AppendedTextsKeepTheirOrderAndNothingBreaksTheMemo)
 
 TEST_F(StoreQuick, InitEmptiesRowOneOnlyAndWithoutTheRowTextIsDropped)
 {
-	ASSERT_NE(nullptr, db());
 	ASSERT_TRUE(db()->addQuickMemo("some text"));
 	db()->excuteSql("UPDATE memo SET _data = '/thumb.jpg' WHERE _id = 1");
 	std::string uuid = quickColumn("UUID");
@@ -77,11 +75,9 @@ TEST_F(StoreQuick, InitEmptiesRowOneOnlyAndWithoutTheRowTextIsDropped)
 
 TEST_F(StoreQuick, PinIsStoredInItsOneRow)
 {
-	ASSERT_NE(nullptr, db());
 	char buffer[64] = "unchanged";
 	EXPECT_FALSE(db()->getHiddenMemoPassword(buffer));
 	EXPECT_STREQ("unchanged", buffer);
-	EXPECT_FALSE(db()->setHiddenMemoPassword(nullptr));
 
 	for (const char *pin : {"it's a hash", "second"}) {
 		ASSERT_TRUE(db()->setHiddenMemoPassword(pin));
