@@ -87,7 +87,7 @@ protected:
 		control->destroy();
 		keys.clear();
 		payloads.clear();
-		clearToasts();
+		desktop_toast_log_clear();
 		return makeControl(doc, mode, uuid);
 	}
 

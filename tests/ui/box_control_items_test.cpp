@@ -21,14 +21,14 @@ TEST_F(BoxControlItemsTest, AllBodyItemsShareOneBudget)
 	MemoBoxItem *big = items()[0];
 	MemoBoxItem *small = items()[1];
 	focusAt(small, -1);
-	clearToasts();
 	elm_entry_entry_insert(small->getEntry(), std::string(100, 'b').c_str());
 	runFor(0.05);
 	EXPECT_EQ(std::string(96, 'b'), text(small));
 	typeText("c");
 	EXPECT_EQ(std::string(96, 'b'), text(small));
-	ASSERT_GE(toastCount(), 1);
-	EXPECT_EQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), toastAt(toastCount() - 1));
+	ASSERT_GE(desktop_toast_log_count(), 1);
+	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"),
+	             desktop_toast_log_get(desktop_toast_log_count() - 1));
 
 	// Moving focus computes the limit again: the big item is full as well.
 	focusAt(big, -1);

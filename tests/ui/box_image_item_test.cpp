@@ -84,9 +84,8 @@ TEST_F(BoxImageItemTest, APictureThatCannotBeReadIsRefusedAndRemoved)
 	fputs("not a picture at all", f);
 	fclose(f);
 	makeControl(nullptr, MODE_NEW);
-	clearToasts();
 	EXPECT_FALSE(control->insertImage(path.c_str()));
-	EXPECT_EQ(1, toastCount());
+	EXPECT_EQ(1, desktop_toast_log_count());
 	EXPECT_FALSE(ecore_file_exists(path.c_str()));
 	EXPECT_EQ("", text(items()[0]));
 }

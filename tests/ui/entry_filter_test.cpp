@@ -30,7 +30,6 @@ protected:
 		sscanf(insert("<item size=1x1 vsize=full href=file:///nowhere/p.png></item>").c_str(), "<item size=%dx%d",
 		       &width, &height);
 		insert("");
-		clearToasts();
 	}
 
 	// The body becomes an empty first item, the target, and one holding `pictures` tags.
@@ -91,7 +90,7 @@ protected:
 };
 } // namespace
 
-TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharacters)
+TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharactersAndNeedsBudget)
 {
 	EXPECT_EQ("one<br/>two<br/>three", insert("one\ntwo\nthree"));
 	EXPECT_EQ("big red<br/>left", insert("<font_size=40>big</font_size> <color=#ff0000>red</color><br/>"
@@ -104,6 +103,16 @@ TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharacters)
 	                          "b&nbsp;c&#160;d&#xa0;e"));
 	EXPECT_EQ("ab<br/>c", insert("a\x01"
 	                             "b\r\nc\x1b"));
+
+	// Without budget nothing enters, and a toast says so.
+	insert("");
+	focus(target->getEntry());
+	typeText("kept");
+	target->setLimit(0);
+	target->insertText("more");
+	EXPECT_EQ("kept", shown());
+	ASSERT_EQ(1, desktop_toast_log_count());
+	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), desktop_toast_log_get(0));
 }
 
 TEST_F(EntryFilterTest, ReturnAfterAPictureKeepsItInPlace)
@@ -119,17 +128,6 @@ TEST_F(EntryFilterTest, ReturnAfterAPictureKeepsItInPlace)
 	EXPECT_EQ(line, elm_entry_entry_get(check->getEntry()));
 	EXPECT_EQ(0u, line.find("ab<item size="));
 	EXPECT_EQ(2u, items().size());
-}
-
-TEST_F(EntryFilterTest, NoBudgetNothingEnters)
-{
-	focus(target->getEntry());
-	typeText("kept");
-	target->setLimit(0);
-	target->insertText("more");
-	EXPECT_EQ("kept", shown());
-	ASSERT_EQ(1, toastCount());
-	EXPECT_EQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), toastAt(0));
 }
 
 TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
@@ -161,16 +159,16 @@ TEST_F(EntryFilterTest, ImageCountLimits)
 	EXPECT_EQ(11u, memo_test::countOf(kept, "<item"));
 	EXPECT_NE(std::string::npos, kept.find("/nowhere/10.png"));
 	EXPECT_EQ(std::string::npos, kept.find("/nowhere/11.png"));
-	ASSERT_EQ(1, toastCount());
-	EXPECT_EQ(limitToast, toastAt(0));
+	ASSERT_EQ(1, desktop_toast_log_count());
+	EXPECT_STREQ(limitToast, desktop_toast_log_get(0));
 	// A memo with one stops at ten in all.
 	withPicturesElsewhere(1);
 	EXPECT_EQ(9u, memo_test::countOf(insert(twelve), "<item"));
-	EXPECT_EQ(1, toastCount());
+	EXPECT_EQ(1, desktop_toast_log_count());
 	// A full memo takes none, with a toast for each refusal.
 	withPicturesElsewhere(10);
 	EXPECT_EQ("ab", insert("a" + ghostTag(1) + ghostTag(2) + "b"));
-	EXPECT_EQ(2, toastCount());
+	EXPECT_EQ(2, desktop_toast_log_count());
 }
 
 TEST_F(EntryFilterTest, PicturesFromElsewhereAreTakenIntoTheMemoAndFitted)

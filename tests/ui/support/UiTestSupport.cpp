@@ -2,7 +2,6 @@
 #include "UiTestSupport.h"
 
 #include <Ecore_Evas.h>
-#include <desktop/toast_log.h>
 
 #include <cmath>
 #include <cstdint>
@@ -53,7 +52,7 @@ void UiFixture::SetUp()
 	if (ee)
 		ecore_evas_focus_set(ee, EINA_TRUE);
 	evas_focus_in(evas());
-	clearToasts();
+	desktop_toast_log_clear();
 	render();
 }
 
@@ -211,22 +210,6 @@ bool writePicture(const std::string &path, int w, int h, uint32_t sky, uint32_t 
 	const Eina_Bool ok = evas_object_image_save(img, path.c_str(), nullptr, "quality=92 compress=1");
 	ecore_evas_free(ee);
 	return ok;
-}
-
-int toastCount()
-{
-	return desktop_toast_log_count();
-}
-
-std::string toastAt(int index)
-{
-	const char *text = desktop_toast_log_get(index);
-	return text ? text : "";
-}
-
-void clearToasts()
-{
-	desktop_toast_log_clear();
 }
 
 } // namespace memo_ui_test

@@ -9,6 +9,8 @@
 #include <string>
 
 #include <Elementary.h>
+// The toasts posted: desktop_toast_log_count(), _get(index) and _clear().
+#include <desktop/toast_log.h>
 #include <gtest/gtest.h>
 
 namespace memo_ui_test
@@ -65,11 +67,6 @@ private:
 // buffer canvas: a small landscape, sky over a hill, so that screenshots show a picture and not a test
 // card. False when Evas cannot save it.
 bool writePicture(const std::string &path, int w, int h, uint32_t sky = 0x7fb6e0, uint32_t hill = 0x3f7a4a);
-
-// The messages posted as toasts since the last clearToasts().
-int toastCount();
-std::string toastAt(int index);
-void clearToasts();
 
 } // namespace memo_ui_test
 
