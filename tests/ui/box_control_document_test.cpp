@@ -80,7 +80,7 @@ TEST_F(BoxControlDocumentTest, StoredDocumentComesBackByteForByteAndRenders)
 	runFor(0.5);
 	render();
 	const std::string shot = memo_test::tempRoot() + "/editor.png";
-	ASSERT_TRUE(screenshot(shot));
+	ASSERT_TRUE(memo_test::saveScreenshot(win, shot));
 	// A blank canvas compresses to almost nothing; a real editor does not.
 	EXPECT_GT(memo_test::readFile(shot).size(), 20000u);
 	const char *update = getenv("MEMO_UPDATE_SCREENSHOTS");

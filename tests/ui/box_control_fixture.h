@@ -42,21 +42,6 @@ inline std::string tag(int w, int h, const std::string &path)
 class BoxControlFixture : public UiFixture
 {
 protected:
-	void SetUp() override
-	{
-		// As the app sets it: layout sizes are given for a scale of 2.6.
-		elm_app_base_scale_set(2.6);
-		UiFixture::SetUp();
-	}
-
-	void TearDown() override
-	{
-		// The control goes with the window.
-		UiFixture::TearDown();
-		control = nullptr;
-		elm_config_scale_set(1.0);
-	}
-
 	// Builds a control for `doc` (may be null) in `mode`, as the scroller's content.
 	MemoBoxControl *makeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
 	{

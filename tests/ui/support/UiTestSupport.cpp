@@ -29,6 +29,8 @@ void initUi()
 void UiFixture::SetUp()
 {
 	initUi();
+	// As the app sets it: layout sizes are given for a scale of 2.6.
+	elm_app_base_scale_set(2.6);
 	win = elm_win_add(nullptr, "memo-ui-test", ELM_WIN_BASIC);
 	ASSERT_NE(win, nullptr);
 	elm_win_autodel_set(win, EINA_FALSE);
@@ -62,6 +64,7 @@ void UiFixture::TearDown()
 		evas_object_del(win);
 	win = scroller = nullptr;
 	runFor(0.02);
+	elm_config_scale_set(1.0);
 }
 
 Evas *UiFixture::evas() const
@@ -126,17 +129,10 @@ void UiFixture::pressKey(const char *keyName, const char *string)
 
 void UiFixture::typeText(const char *text)
 {
-	for (const char *p = text; p && *p; p++) {
-		char typed[2] = {*p, '\0'};
-		std::string keyName = typed;
-		if (*p == ' ')
-			keyName = "space";
-		else if (*p == '.')
-			keyName = "period";
-		else if (*p == ',')
-			keyName = "comma";
-		evas_event_feed_key_down(evas(), keyName.c_str(), keyName.c_str(), typed, typed, ++__timestamp, nullptr);
-		evas_event_feed_key_up(evas(), keyName.c_str(), keyName.c_str(), typed, typed, ++__timestamp, nullptr);
+	for (const char *p = text; *p; p++) {
+		const char typed[2] = {*p, '\0'};
+		evas_event_feed_key_down(evas(), typed, typed, typed, typed, ++__timestamp, nullptr);
+		evas_event_feed_key_up(evas(), typed, typed, typed, typed, ++__timestamp, nullptr);
 	}
 	runFor(0.03);
 }
@@ -182,12 +178,6 @@ void UiFixture::focus(Evas_Object *widget)
 	evas_focus_in(evas());
 	elm_object_focus_set(widget, EINA_TRUE);
 	runFor(0.02);
-}
-
-bool UiFixture::screenshot(const std::string &pngPath)
-{
-	render();
-	return memo_test::saveScreenshot(win, pngPath);
 }
 
 bool writePicture(const std::string &path, int w, int h, uint32_t sky, uint32_t hill)

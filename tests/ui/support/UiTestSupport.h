@@ -19,7 +19,8 @@ namespace memo_ui_test
 // Elementary and the app's theme, once per process. Safe to call again.
 void initUi();
 
-// A window of 720 x 1280 with a background and a scroller.
+// A window of 720 x 1280 with a background and a scroller, at the app's scale; tests may change the
+// scale.
 class UiFixture : public ::testing::Test
 {
 protected:
@@ -38,7 +39,7 @@ protected:
 
 	// One key press and release (`string` is what the key types, null for none), then the handlers run.
 	void pressKey(const char *keyName, const char *string = nullptr);
-	// Types UTF-8 text one character per key press (ASCII letters, digits, blanks and punctuation).
+	// Types ASCII letters and digits, one key press each.
 	void typeText(const char *text);
 
 	// Pointer events at canvas coordinates; each lets the handlers run.
@@ -52,9 +53,6 @@ protected:
 
 	// Focuses the widget and gives the canvas the keyboard.
 	void focus(Evas_Object *widget);
-
-	// Saves the window as PNG.
-	bool screenshot(const std::string &pngPath);
 
 	Evas_Object *win = nullptr;
 	Evas_Object *scroller = nullptr;
