@@ -37,16 +37,9 @@ void changedCb(system_settings_key_e key, void *data)
 {
 	static_cast<std::vector<int> *>(data)->push_back(key);
 }
-
-class SystemSettings : public testing::Test
-{
-protected:
-	void SetUp() override { ecore_init(); }
-	void TearDown() override { ecore_shutdown(); }
-};
 } // namespace
 
-TEST_F(SystemSettings, LocaleKeysComeFromVconfWithoutCodesetOthersAreRefused)
+TEST(SystemSettings, LocaleKeysComeFromVconfWithoutCodesetOthersAreRefused)
 {
 	ASSERT_EQ(VCONF_OK, vconf_set_str(VCONFKEY_LANGSET, "de_DE.UTF-8"));
 	ASSERT_EQ(VCONF_OK, vconf_set_str(VCONFKEY_REGIONFORMAT, "ko_KR.UTF-8"));
@@ -89,8 +82,9 @@ TEST_F(SystemSettings, LocaleKeysComeFromVconfWithoutCodesetOthersAreRefused)
 	EXPECT_EQ(SYSTEM_SETTINGS_ERROR_INVALID_PARAMETER, system_settings_set_value_int(SYSTEM_SETTINGS_KEY_FONT_SIZE, 9));
 }
 
-TEST_F(SystemSettings, ChangedCallbackFollowsTheVconfKeyUntilUnset)
+TEST(SystemSettings, ChangedCallbackFollowsTheVconfKeyUntilUnset)
 {
+	ecore_init(); // for the change notices
 	std::vector<int> seen;
 	ASSERT_EQ(SYSTEM_SETTINGS_ERROR_NONE,
 	          system_settings_set_changed_cb(SYSTEM_SETTINGS_KEY_LOCALE_LANGUAGE, changedCb, &seen));
