@@ -1,38 +1,16 @@
-// The converter's stored forms, the quick memo append, and a huge item.
+// The converter's stored forms and a huge item; the quick memo append is checked through the store.
 #include "MemoCvt.h"
-#include "TestEnv.h"
 #include "todolist_fixture.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdlib>
 #include <string>
-#include <vector>
 
 using namespace todolist_test;
 
 namespace
 {
-// The quick memo append as the store runs it against the stored document.
-std::string quickDocument(std::string stored, const std::string &text)
-{
-	if (stored.find("</todolist>") == std::string::npos)
-		stored = "<todolist></todolist>";
-	const size_t end = stored.find("</todolist>");
-	return stored.replace(end, 11,
-	                      "<todolist_item todo_item_type=\"0\" todo_item_state=\"false\" todo_item_content=\"" + text +
-	                          "\"/></todolist>");
-}
-
-std::string quickAppend(const std::string &stored, const std::string &text, std::string *display = nullptr)
-{
-	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, quickDocument(stored, text));
-	cvt.addQuickMemoItem(text);
-	if (display)
-		*display = cvt.getDisplayContent();
-	return cvt.getTizenXmlContent();
-}
-
 const std::string MIXED = compose({
     item(MEMO_BOX_ITEM_FIRST_TEXT, false,
          "Tom &amp; Jerry &lt;3<br/>line2<br/><item size=240x180 vsize=full href=file:///m/a b.jpg></item><br/>tail"),
@@ -68,43 +46,6 @@ TEST(MemoCvtForms, EveryFormOfAMixedMemo)
 		                  empty.getTizenXmlContent());
 		EXPECT_NE(std::string::npos, empty.getXmlContent().find("<memo version=\"1\"/>")) << empty.getXmlContent();
 	}
-}
-
-TEST(MemoCvtQuickMemo, EachTextOnceInOrderWhateverItHolds)
-{
-	const std::string text = "say \"hi\" &amp; <b>\nnext";
-	std::string display;
-	const std::string first = quickAppend("", text, &display);
-	EXPECT_EQ("say \"hi\" & \xEF\xBC\x9C"
-	          "b\xEF\xBC\x9E\nnext",
-	          display);
-	std::vector<MemoTodoListItem> items = parse(first);
-	ASSERT_EQ(1u, items.size());
-	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, items[0].type);
-	EXPECT_EQ("say \"hi\" &amp; &lt;b&gt;<br/>next", items[0].content);
-
-	// Earlier items, check states included, survive; each text is there once, in order.
-	const std::string stored = compose({item(MEMO_BOX_ITEM_FIRST_CHECK, true, "a"), parse(first)[0]});
-	const std::string second = quickAppend(stored, "two & \"more\"");
-	items = parse(second);
-	ASSERT_EQ(3u, items.size());
-	EXPECT_TRUE(items[0].checked);
-	EXPECT_EQ("two &amp; \"more\"", items[2].content);
-	MemoCvt cvt(MEMO_CVT_SRC_TODOLIST, second);
-	EXPECT_EQ(1u, memo_test::countOf(cvt.getStrippedContent(), "say \"hi\""));
-	EXPECT_EQ(1u, memo_test::countOf(cvt.getStrippedContent(), "two & \"more\""));
-
-	// Content behind the first root is no part of the body, and the text is there once.
-	items = parse(quickAppend(stored + "<todolist>\n</todolist>\n", "c"));
-	ASSERT_EQ(3u, items.size());
-	EXPECT_EQ("c", items[2].content);
-
-	// A source that does not end with the appended item still gets the text once, at the end.
-	MemoCvt plain(MEMO_CVT_SRC_TODOLIST, stored);
-	plain.addQuickMemoItem("z");
-	items = parse(plain.getTizenXmlContent());
-	ASSERT_EQ(3u, items.size());
-	EXPECT_EQ("z", items[2].content);
 }
 
 // Malformed documents are the fuzz target's: its corpus holds the known ones, each checked for valid text
