@@ -34,6 +34,9 @@ TEST_F(BoxItemKeysTest, ReturnOnEachKindOfLine)
 	    {todoItem(1, false, ""), 0, -1, "5:"},
 	    // Mid-line the rest moves into the new check line, without a break.
 	    {todoItem(1, false, "milkbread"), 0, 4, "2:milk 1:bread"},
+	    // The split puts pictures back where no-break spaces stood: the filter took a pasted one out.
+	    {todoItem(1, false, "a&nbsp;b" + tag(521, 392, "/nowhere/p.png")), 0, -1,
+	     "2:ab<item size=521x392 vsize=full href=file:///nowhere/p.png></item> 1:"},
 	    // A text block takes the break.
 	    {todoItem(0, false, "ab"), 0, -1, "5:ab<br/>"},
 	};

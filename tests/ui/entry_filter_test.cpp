@@ -115,21 +115,6 @@ TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharactersAn
 	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), desktop_toast_log_get(0));
 }
 
-TEST_F(EntryFilterTest, ReturnAfterAPictureKeepsItInPlace)
-{
-	// The split of a line puts pictures back where no-break spaces stand; a pasted one must not be there.
-	withBody(todoItem(1, false, ""));
-	MemoBoxItem *check = items()[0];
-	check->insertText(("a&nbsp;b" + ghostTag(1)).c_str());
-	const std::string line = elm_entry_entry_get(check->getEntry());
-	focusAt(check);
-	pressKey("Return", "\r");
-	runFor(0.05);
-	EXPECT_EQ(line, elm_entry_entry_get(check->getEntry()));
-	EXPECT_EQ(0u, line.find("ab<item size="));
-	EXPECT_EQ(2u, items().size());
-}
-
 TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
 {
 	ASSERT_GT(width, 1);
