@@ -85,7 +85,7 @@ TEST_F(BoxItemKeysTest, ReturnOnACheckLineAddsTheNewLineRightBehindItAndNextLeav
 	EXPECT_EQ(4, elm_entry_cursor_pos_get(added->getEntry()));
 }
 
-TEST_F(BoxItemKeysTest, BackSpaceTurnsCheckLinesIntoTextThenMerges)
+TEST_F(BoxItemKeysTest, BackSpaceTurnsCheckLinesIntoTextThenMergesKeepingEverything)
 {
 	withBody(todoItem(0, false, "first") + todoItem(1, false, "milk") + todoItem(1, false, "abc"));
 	// Inside a line BackSpace only deletes; the press that empties a line does not act on it as well.
@@ -109,15 +109,13 @@ TEST_F(BoxItemKeysTest, BackSpaceTurnsCheckLinesIntoTextThenMerges)
 	pressKey("BackSpace", "\b");
 	EXPECT_EQ("5:firstmilk 0:", shape());
 	EXPECT_EQ(5, elm_entry_cursor_pos_get(items()[0]->getEntry()));
-}
 
-TEST_F(BoxItemKeysTest, BackSpaceMergesIntoTheNeighbourAndKeepsEverything)
-{
+	// The first item merges into the next one, which takes over the head.
 	withBody(todoItem(0, false, "one") + todoItem(1, true, "two") + todoItem(0, false, std::string(2500, 'a')) +
 	         todoItem(0, false, std::string(1500, 'b')));
 	MemoBoxItem *second = items()[1];
 	backSpaceAtStart(items()[0]);
-	// The next item takes over the head, and the removed text goes behind its own.
+	// The removed text goes behind the neighbour's own.
 	ASSERT_EQ(3u, items().size());
 	EXPECT_EQ(second, items()[0]);
 	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, second->getType());
