@@ -149,6 +149,9 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 {
 	if (!app_control)
 		return launch_error(APP_CONTROL_ERROR_INVALID_PARAMETER, "invalid parameter", NULL);
+	/* No app named: the registered apps that take the operation, picked by the user when several do. */
+	if (!app_control->app_id && app_control->operation)
+		return app_chooser_send(app_control, callback, user_data);
 	char *app_id = target_resolve(app_control);
 	if (!app_id)
 		return launch_error(APP_CONTROL_ERROR_APP_NOT_FOUND, "no registered app takes the operation",

@@ -38,6 +38,7 @@ typedef struct {
 	char *label;
 	char *icon;
 	char *operations; /* comma-separated, may be NULL */
+	char *mimes;      /* comma-separated, may be NULL: then any */
 } app_registry_entry_s;
 
 /* Looks the id up in TIZEN_APPS_DIR (colon-separated) and then the built-in folder; NULL if absent. */
@@ -46,9 +47,19 @@ app_registry_entry_s *app_registry_find(const char *app_id);
 void app_registry_foreach(bool (*cb)(const app_registry_entry_s *entry, void *data), void *data);
 /* True when the entry handles the operation (an entry without operations takes none). */
 bool app_registry_entry_handles(const app_registry_entry_s *entry, const char *operation);
+/* True when the entry handles the operation and, for a request with a mime type, declares no mime types
+   or one that matches it (a "*" subtype matches every subtype of its type, either way round). */
+bool app_registry_entry_takes(const app_registry_entry_s *entry, const char *operation, const char *mime);
 void app_registry_entry_free(app_registry_entry_s *entry);
 /* Starts the entry's program with TIZEN_APP_ID=<id> and the "wait for the request" mark; pid or -1 (logged). */
 pid_t app_registry_spawn(const app_registry_entry_s *entry);
+
+/* ---- requests without an app id (app_chooser.c) ---- */
+
+/* Sends a request that names an operation but no app: to the one registered app that takes it, or,
+   when several do, to the one the user picks in a chooser window (the reply callback then answers
+   "canceled" when the chooser is closed). APP_CONTROL_ERROR_APP_NOT_FOUND when none takes it. */
+int app_chooser_send(app_control_h request, app_control_reply_cb callback, void *user_data);
 
 /* ---- handle internals (app_control.c) ---- */
 
