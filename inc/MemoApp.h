@@ -57,6 +57,8 @@ private:
 	app_assist::WNaviframeController *__getNaviframe() const;
 	app_assist::WContentViewController *__getTopView() const;
 	void __saveOpenEditor();
+	// The first page of a launch that shows the list: plainly, or answering a pick request.
+	void __pushListView(app_control_s *request, const char *operation);
 
 	static void __bindTextDomains();
 	static char *__getResourcePathN(const char *resourceId);
