@@ -72,17 +72,17 @@ std::string addMemo(const MemoSpec &spec)
 	free(title);
 	info->setDisplayContent(spec.display.c_str());
 	info->setStrippedContent(spec.display.c_str());
-	std::string document = spec.document;
+	std::string document = spec.tizenXml;
 	if (document.empty() && !spec.display.empty())
 		document = "<todolist></todolist>";
 	info->setTizenXmlContent(document.c_str());
-	info->setVrfileUUID(spec.voice.c_str());
+	info->setVrfileUUID(spec.voiceUuid.c_str());
 	info->setData(spec.thumbnail.c_str());
-	if (!spec.color.empty())
-		info->setBgColor(spec.color.c_str());
-	info->setIsFavorite(spec.favourite);
-	info->setIsHidden(spec.hidden);
-	gLastModified = spec.modifiedAt ? spec.modifiedAt : gLastModified + 1000;
+	if (!spec.bgColor.empty())
+		info->setBgColor(spec.bgColor.c_str());
+	info->setIsFavorite(spec.isFavourite);
+	info->setIsHidden(spec.isHidden);
+	gLastModified += 1000;
 	info->setCreatedAt(gLastModified);
 	info->setLastModifiedAt(gLastModified);
 	std::string uuid = info->getMemoUUID();

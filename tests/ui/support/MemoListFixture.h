@@ -20,18 +20,48 @@ class MemoListView;
 namespace memo_ui_test
 {
 
-// A memo as it is written to the store.
+// A memo as it is written to the store: MemoSpec("title", "display").voice("vr-1").favourite().
 struct MemoSpec {
+	explicit MemoSpec(std::string memoTitle = "", std::string memoDisplay = "")
+	    : title(std::move(memoTitle)), display(std::move(memoDisplay))
+	{
+	}
+	MemoSpec &voice(const std::string &uuid) { return set(voiceUuid, uuid); }
+	MemoSpec &picture(const std::string &path) { return set(thumbnail, path); }
+	MemoSpec &color(const std::string &text) { return set(bgColor, text); }
+	MemoSpec &document(const std::string &xml) { return set(tizenXml, xml); }
+	MemoSpec &file(const std::string &path)
+	{
+		files.push_back(path);
+		return *this;
+	}
+	MemoSpec &favourite()
+	{
+		isFavourite = 1;
+		return *this;
+	}
+	MemoSpec &hidden()
+	{
+		isHidden = 1;
+		return *this;
+	}
+
 	std::string title;
 	std::string display;  // display_Content, with "<CHECK state=...>" markers
-	std::string document; // tizenXmlContent; a non-empty display gets a stand-in document when empty
-	std::string voice;    // vrfileUUID
+	std::string tizenXml; // a non-empty display gets a stand-in document when this stays empty
+	std::string voiceUuid;
 	std::string thumbnail;
 	std::vector<std::string> files; // paths of file rows
-	std::string color;              // bgColor
-	int favourite = 0;
-	int hidden = 0;
-	unsigned long long modifiedAt = 0; // 0: later than the memo before
+	std::string bgColor;
+	int isFavourite = 0;
+	int isHidden = 0;
+
+private:
+	MemoSpec &set(std::string &field, const std::string &value)
+	{
+		field = value;
+		return *this;
+	}
 };
 
 // Display text of check lines: '+' ticked, '-' unticked, anything else a plain line, then the text.
