@@ -1,6 +1,8 @@
 // Scaffolding of the memo list tests.
 #include "MemoListFixture.h"
 
+#include <clocale>
+
 #include <app_common.h>
 #include <app_control.h>
 #include <app_preference.h>
@@ -60,7 +62,6 @@ void resetStore()
 	for (const char *key : {"db/desktop/account/list", "db/desktop/csc/feature_92", "db/memo/data-change",
 	                        "db/desktop/storage/internal_free_bytes", "db/setting/psmode"})
 		vconf_unset(key);
-	MemoDbMgr::getInstance();
 }
 
 std::string addMemo(const MemoSpec &spec)
@@ -168,10 +169,11 @@ void ListViewFixture::SetUp()
 	// The app makes its own window; the helpers of UiFixture act on that one.
 	evas_object_del(win);
 	win = scroller = box = nullptr;
+	// As the platform sets the device language: C.UTF-8, under which gettext honours LANGUAGE.
 	setenv("LANGUAGE", "en", 1);
+	setlocale(LC_MESSAGES, "C.UTF-8");
 	gIsPortrait = 1;
 	resetStore();
-	MemoDbMgr::destroy();
 }
 
 void ListViewFixture::TearDown()
@@ -220,7 +222,7 @@ Evas_Object *ListViewFixture::gengrid()
 	MemoListView *view = listView();
 	Evas_Object *content = view ? elm_object_part_content_get(view->getEvasObj(), "contents") : nullptr;
 	const char *type = content ? elm_object_widget_type_get(content) : nullptr;
-	return (type && std::string(type).find("gengrid") != std::string::npos) ? content : nullptr;
+	return (type && std::string(type).find("Gengrid") != std::string::npos) ? content : nullptr;
 }
 
 Evas_Object *ListViewFixture::floatingButton()
