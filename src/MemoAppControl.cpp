@@ -4,6 +4,7 @@
 #include <cstdlib>
 #include <cstring>
 
+#include <Elementary.h>
 #include <app_control.h>
 
 #include <WNaviframeController.h>
@@ -12,6 +13,7 @@
 #include "DataBase/MemoDocInfo.h"
 #include "MemoLog.h"
 #include "View/MemoEditView.h"
+#include "View/MemoListView.h"
 
 using app_assist::WNaviframeController;
 
@@ -67,6 +69,30 @@ void MemoApp::__pushFirstView(app_control_s *request, const char *operation)
 		}
 		free(uuid);
 	}
-	// Every other start shows the memo list; until the list is part of the app, a new memo stands in.
-	naviframe->push(new MemoEditView(nullptr, false, false));
+	// Every other start shows the memo list.
+	__pushListView(request, operation);
+}
+
+// A pick request gets a clone of itself to the list, which answers it; the process then ends with the list's
+// page. Every other operation shows the list plainly.
+void MemoApp::__pushListView(app_control_s *request, const char *operation)
+{
+	WNaviframeController *naviframe = __getNaviframe();
+	if (!naviframe) {
+		MEMO_LOGE("no naviframe to show the list on");
+		return;
+	}
+	if (!operation || strcmp(operation, APP_CONTROL_OPERATION_PICK)) {
+		naviframe->push(new MemoListView());
+		return;
+	}
+	setExitOnLastPop(naviframe);
+	app_control_h pickRequest = nullptr;
+	if (app_control_clone(&pickRequest, request) != APP_CONTROL_ERROR_NONE) {
+		MEMO_LOGE("the pick request cannot be kept");
+		naviframe->push(new MemoListView());
+		return;
+	}
+	// The view owns the clone from its creation on, a failed push included.
+	naviframe->push(new MemoListView(), nullptr, &pickRequest);
 }

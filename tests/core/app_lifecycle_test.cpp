@@ -158,10 +158,10 @@ TEST_F(AppLifecycleTest, startShowsOneFirstPageCarriesDeviceChangesToTheBusAndEn
 		EXPECT_STREQ(current->getWindowController()->getName(), "com.veltron.memo");
 		app_assist::WNaviframeController *naviframe = app_test::naviframeOf(current);
 		ASSERT_NE(naviframe, nullptr);
-		// The first request pushed the one first page (a new memo until the list stands in its place).
+		// The first request pushed the one first page, the memo list.
 		EXPECT_EQ(naviframe->getContentViewCount(), 1);
 		ASSERT_NE(naviframe->getTopContentViewController(), nullptr);
-		EXPECT_STREQ(naviframe->getTopContentViewController()->getClassName(), "MemoEditView");
+		EXPECT_STREQ(naviframe->getTopContentViewController()->getClassName(), "MemoListView");
 
 		// The app's theme: its base layout holding the naviframe, its tables applied.
 		Evas_Object *baseLayout = current->getWindowController()->getBaseLayoutEvasObj();
