@@ -193,6 +193,10 @@ static void chooser_show(chooser_s *c)
 int app_chooser_send(app_control_h request, app_control_reply_cb callback, void *user_data)
 {
 	collect_s collect = {request, NULL};
+	/* The lists need Eina even in a program that never started Elementary; one hold for the process. */
+	static bool eina_held;
+	if (!eina_held)
+		eina_held = eina_init() > 0;
 	app_registry_foreach(collect_cb, &collect);
 	unsigned int count = eina_list_count(collect.ids);
 	if (count == 0) {

@@ -144,6 +144,12 @@ void UiFixture::mouseDown(int x, int y)
 	runFor(0.02);
 }
 
+void UiFixture::mouseMove(int x, int y)
+{
+	evas_event_feed_mouse_move(evas(), x, y, ++__timestamp, nullptr);
+	runFor(0.02);
+}
+
 void UiFixture::mouseUp(int x, int y)
 {
 	evas_event_feed_mouse_move(evas(), x, y, ++__timestamp, nullptr);

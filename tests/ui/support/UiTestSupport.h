@@ -44,6 +44,7 @@ protected:
 
 	// Pointer events at canvas coordinates; each lets the handlers run.
 	void mouseDown(int x, int y);
+	void mouseMove(int x, int y);
 	void mouseUp(int x, int y);
 	// Down and up at one point, or at the centre of an object.
 	void tap(int x, int y);
