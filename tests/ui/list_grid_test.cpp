@@ -97,8 +97,8 @@ TEST_F(GridTest, cardsDrawTitleTextChecksAndPicturesByLayout)
 	EXPECT_EQ("Tea &amp; cake", cardText(card, "title"));
 	// The card's surface takes the memo's own colour.
 	int r = 0, g = 0, b = 0;
-	edje_object_color_class_get(elm_layout_edje_get(cardContent(card, "card.bg")), "AO001", &r, &g, &b, nullptr,
-	                            nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr);
+	edje_object_color_class_get(evas_object_smart_parent_get(cardContent(card, "card.bg")), "AO001", &r, &g, &b,
+	                            nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr);
 	EXPECT_EQ(250 + 220 + 160, r + g + b);
 
 	card = cardOf(bodyOnly);
