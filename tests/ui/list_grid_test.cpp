@@ -90,7 +90,7 @@ TEST_F(GridTest, cardsDrawTitleTextChecksAndPicturesByLayout)
 	std::string favouriteVoice = addMemo(MemoSpec("", "recorded twice").voice("vr-2").favourite());
 	makeGrid();
 	elm_scroller_region_show(grid->getEvasObj(), 0, 0, 480, 4000);
-	evas_object_resize(win, 480, 4000);
+	resizeWindow(480, 4000);
 
 	Elm_Object_Item *card = cardOf(titleOnly);
 	EXPECT_EQ(1, typeOf(card));
@@ -229,7 +229,7 @@ TEST_F(GridTest, rotationKeepsTheScrollPosition)
 	ASSERT_EQ(700, y);
 
 	gIsPortrait = 0;
-	evas_object_resize(win, 800, 480);
+	resizeWindow(800, 480);
 	grid->updateGrid(true);
 	render();
 	grid->restoreScrollPosition();

@@ -29,12 +29,6 @@ struct MemoSpec {
 	MemoSpec &voice(const std::string &uuid) { return set(voiceUuid, uuid); }
 	MemoSpec &picture(const std::string &path) { return set(thumbnail, path); }
 	MemoSpec &color(const std::string &text) { return set(bgColor, text); }
-	MemoSpec &document(const std::string &xml) { return set(tizenXml, xml); }
-	MemoSpec &file(const std::string &path)
-	{
-		files.push_back(path);
-		return *this;
-	}
 	MemoSpec &favourite()
 	{
 		isFavourite = 1;
@@ -51,7 +45,6 @@ struct MemoSpec {
 	std::string tizenXml; // a non-empty display gets a stand-in document when this stays empty
 	std::string voiceUuid;
 	std::string thumbnail;
-	std::vector<std::string> files; // paths of file rows
 	std::string bgColor;
 	int isFavourite = 0;
 	int isHidden = 0;
@@ -78,6 +71,9 @@ protected:
 	void SetUp() override;
 	void TearDown() override;
 
+	// Resizes the window once the canvas has finished drawing: the buffer engine's render thread must not
+	// draw into a buffer that the resize replaces.
+	void resizeWindow(int w, int h);
 	// A grid of the given mode (null: the main list) filling the window, updated once.
 	MemoGridControl *makeGrid(int *mode = nullptr);
 	// The card at index after a render, null past the end.
