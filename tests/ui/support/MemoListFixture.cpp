@@ -64,25 +64,25 @@ void resetStore()
 		vconf_unset(key);
 }
 
-std::string addMemo(const MemoSpec &spec)
+std::string addMemo(const TestMemo &memo)
 {
 	MemoDocInfo *info = new MemoDocInfo();
 	// Titles come from the editor as markup.
-	char *title = elm_entry_utf8_to_markup(spec.title.c_str());
+	char *title = elm_entry_utf8_to_markup(memo.title.c_str());
 	info->setTitle(title);
 	free(title);
-	info->setDisplayContent(spec.display.c_str());
-	info->setStrippedContent(spec.display.c_str());
-	std::string document = spec.tizenXml;
-	if (document.empty() && !spec.display.empty())
+	info->setDisplayContent(memo.display.c_str());
+	info->setStrippedContent(memo.display.c_str());
+	std::string document = memo.tizenXml;
+	if (document.empty() && !memo.display.empty())
 		document = "<todolist></todolist>";
 	info->setTizenXmlContent(document.c_str());
-	info->setVrfileUUID(spec.voiceUuid.c_str());
-	info->setData(spec.thumbnail.c_str());
-	if (!spec.bgColor.empty())
-		info->setBgColor(spec.bgColor.c_str());
-	info->setIsFavorite(spec.isFavourite);
-	info->setIsHidden(spec.isHidden);
+	info->setVrfileUUID(memo.voiceUuid.c_str());
+	info->setData(memo.thumbnail.c_str());
+	if (!memo.bgColor.empty())
+		info->setBgColor(memo.bgColor.c_str());
+	info->setIsFavorite(memo.isFavourite);
+	info->setIsHidden(memo.isHidden);
 	gLastModified += 1000;
 	info->setCreatedAt(gLastModified);
 	info->setLastModifiedAt(gLastModified);

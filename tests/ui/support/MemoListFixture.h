@@ -20,21 +20,21 @@ class MemoListView;
 namespace memo_ui_test
 {
 
-// A memo as it is written to the store: MemoSpec("title", "display").voice("vr-1").favourite().
-struct MemoSpec {
-	explicit MemoSpec(std::string memoTitle = "", std::string memoDisplay = "")
+// A memo as it is written to the store: TestMemo("title", "display").voice("vr-1").favourite().
+struct TestMemo {
+	explicit TestMemo(std::string memoTitle = "", std::string memoDisplay = "")
 	    : title(std::move(memoTitle)), display(std::move(memoDisplay))
 	{
 	}
-	MemoSpec &voice(const std::string &uuid) { return set(voiceUuid, uuid); }
-	MemoSpec &picture(const std::string &path) { return set(thumbnail, path); }
-	MemoSpec &color(const std::string &text) { return set(bgColor, text); }
-	MemoSpec &favourite()
+	TestMemo &voice(const std::string &uuid) { return set(voiceUuid, uuid); }
+	TestMemo &picture(const std::string &path) { return set(thumbnail, path); }
+	TestMemo &color(const std::string &text) { return set(bgColor, text); }
+	TestMemo &favourite()
 	{
 		isFavourite = 1;
 		return *this;
 	}
-	MemoSpec &hidden()
+	TestMemo &hidden()
 	{
 		isHidden = 1;
 		return *this;
@@ -50,7 +50,7 @@ struct MemoSpec {
 	int isHidden = 0;
 
 private:
-	MemoSpec &set(std::string &field, const std::string &value)
+	TestMemo &set(std::string &field, const std::string &value)
 	{
 		field = value;
 		return *this;
@@ -62,7 +62,7 @@ std::string checkLines(const std::vector<std::string> &lines);
 
 // Store helpers: every test starts from no database, no media and the feature keys unset.
 void resetStore();
-std::string addMemo(const MemoSpec &spec);
+std::string addMemo(const TestMemo &memo);
 std::string dataPath();
 
 class GridFixture : public UiFixture
