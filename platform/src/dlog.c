@@ -133,12 +133,24 @@ static void flush_at_exit(void)
 	pthread_mutex_unlock(&log_lock);
 }
 
-/* A child keeps nothing of its parent's log but the file: lines gathered there are the parent's to write. */
+/* A fork waits for a line in progress, so that the child's lock is free. The child keeps nothing of its
+   parent's log but the file: lines gathered there are the parent's to write. */
+static void lock_for_fork(void)
+{
+	pthread_mutex_lock(&log_lock);
+}
+
+static void unlock_after_fork(void)
+{
+	pthread_mutex_unlock(&log_lock);
+}
+
 static void forget_after_fork(void)
 {
 	pid = 0;
 	buffered = 0;
 	flush_idler = NULL;
+	pthread_mutex_unlock(&log_lock);
 }
 
 /* A line may wait for the loop to go idle only on the loop's own thread while the loop runs: nothing else
@@ -188,7 +200,7 @@ int __dlog_vprint(log_id_t log_id, int prio, const char *tag, const char *fmt, v
 	if (!exit_hooked) {
 		exit_hooked = true;
 		atexit(flush_at_exit);
-		pthread_atfork(NULL, NULL, forget_after_fork);
+		pthread_atfork(lock_for_fork, unlock_after_fork, forget_after_fork);
 	}
 	if (!may_wait(prio)) {
 		flush_locked(line, (size_t)len);

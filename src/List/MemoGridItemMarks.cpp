@@ -38,24 +38,13 @@ Evas_Object *__layoutOf(Evas_Object *parent, const char *group)
 }
 } // namespace
 
-// The card's own surface. With the quick memo feature the memo's colour goes on its colour classes.
+// The card draws its surface itself; the part holds an empty object, which also tells the other parts'
+// requests which theme object is the card's (its smart parent once swallowed).
 Evas_Object *MemoGridItem::__createSurface(Evas_Object *grid)
 {
-	if (!__docInfo)
-		return nullptr;
-	Evas_Object *surface = __layoutOf(grid, "memo_card_bg");
-	if (MemoUtil::isQuickMemoFeatureEnabled()) {
-		int r = 0, g = 0, b = 0, a = 0;
-		__docInfo->getBgColorRgba(&r, &g, &b, &a);
-		Evas_Object *edje = elm_layout_edje_get(surface);
-		for (const char *code : {"AO001", "AO001S", "AO002"})
-			edje_object_color_class_set(edje, code, r, g, b, a, r, g, b, a, r, g, b, a);
-	}
-	if (__docInfo->getIsFavorite())
-		elm_layout_signal_emit(surface, "set,favorite", "elm");
-	if (__docInfo->getIsQuick())
-		elm_layout_signal_emit(surface, "set,quickmemo", "elm");
-	return surface;
+	Evas_Object *anchor = evas_object_rectangle_add(evas_object_evas_get(grid));
+	evas_object_color_set(anchor, 0, 0, 0, 0);
+	return anchor;
 }
 
 Evas_Object *MemoGridItem::__createSelectionCheck(Evas_Object *grid)

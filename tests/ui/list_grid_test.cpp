@@ -77,28 +77,28 @@ TEST_F(GridTest, cardsDrawTitleTextChecksAndPicturesByLayout)
 	std::string picture = memo_test::makeTempDir("grid-pictures") + "/thumb.jpg";
 	ASSERT_TRUE(writePicture(picture, 120, 90));
 	std::string longLine(260, 'x');
-	std::string titleOnly = addMemo(MemoSpec("Tea & cake").color("250;220;160;255;"));
-	std::string bodyOnly = addMemo(MemoSpec("", "Call the garage\nabout the tyres"));
-	std::string oneTicked = addMemo(MemoSpec("", checkLines({"+eggs"})));
-	std::string two = addMemo(MemoSpec("Bakery", checkLines({"+bread", "-butter"})));
-	std::string three = addMemo(MemoSpec("Trip", checkLines({"-tickets", "pack light", "+hotel"})));
-	std::string six = addMemo(MemoSpec("", checkLines({"-a", "-b", "-c", "+d", "-e", "-f"})));
-	std::string five = addMemo(MemoSpec("Week", checkLines({"+mon", "-tue", "-" + longLine, "-thu", "-fri"})));
-	std::string withPicture = addMemo(MemoSpec("Lake").picture(picture));
-	std::string pictureGone = addMemo(MemoSpec("Old").picture(picture + ".gone"));
-	std::string voice = addMemo(MemoSpec("", "recorded at the pier").voice("vr-1"));
-	std::string favouriteVoice = addMemo(MemoSpec("", "recorded twice").voice("vr-2").favourite());
+	std::string titleOnly = addMemo(TestMemo("Tea & cake").color("250;220;160;255;"));
+	std::string bodyOnly = addMemo(TestMemo("", "Call the garage\nabout the tyres"));
+	std::string oneTicked = addMemo(TestMemo("", checkLines({"+eggs"})));
+	std::string two = addMemo(TestMemo("Bakery", checkLines({"+bread", "-butter"})));
+	std::string three = addMemo(TestMemo("Trip", checkLines({"-tickets", "pack light", "+hotel"})));
+	std::string six = addMemo(TestMemo("", checkLines({"-a", "-b", "-c", "+d", "-e", "-f"})));
+	std::string five = addMemo(TestMemo("Week", checkLines({"+mon", "-tue", "-" + longLine, "-thu", "-fri"})));
+	std::string withPicture = addMemo(TestMemo("Lake").picture(picture));
+	std::string pictureGone = addMemo(TestMemo("Old").picture(picture + ".gone"));
+	std::string voice = addMemo(TestMemo("", "recorded at the pier").voice("vr-1"));
+	std::string favouriteVoice = addMemo(TestMemo("", "recorded twice").voice("vr-2").favourite());
 	makeGrid();
 	elm_scroller_region_show(grid->getEvasObj(), 0, 0, 480, 4000);
-	evas_object_resize(win, 480, 4000);
+	resizeWindow(480, 4000);
 
 	Elm_Object_Item *card = cardOf(titleOnly);
 	EXPECT_EQ(1, typeOf(card));
 	EXPECT_EQ("Tea &amp; cake", cardText(card, "title"));
 	// The card's surface takes the memo's own colour.
 	int r = 0, g = 0, b = 0;
-	edje_object_color_class_get(elm_layout_edje_get(cardContent(card, "card.bg")), "AO001", &r, &g, &b, nullptr,
-	                            nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr);
+	edje_object_color_class_get(evas_object_smart_parent_get(cardContent(card, "card.bg")), "AO001", &r, &g, &b,
+	                            nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr);
 	EXPECT_EQ(250 + 220 + 160, r + g + b);
 
 	card = cardOf(bodyOnly);
@@ -173,8 +173,8 @@ TEST_F(GridTest, keywordsAreHighlightedOutsideTags)
 	EXPECT_EQ("as it is", memoGridHighlight("as it is", "", match, other));
 
 	// Through a search grid: the keyword reaches the title and the body of the matching card.
-	std::string uuid = addMemo(MemoSpec("Lake trip", "swim in the lake"));
-	addMemo(MemoSpec("Other", "nothing here"));
+	std::string uuid = addMemo(TestMemo("Lake trip", "swim in the lake"));
+	addMemo(TestMemo("Other", "nothing here"));
 	makeGrid();
 	int count = -1;
 	grid->searchGrid("lake", &count);
@@ -191,9 +191,9 @@ TEST_F(GridTest, eachGridModeReadsItsRows)
 	MemoItemList *list = MemoDbMgr::getInstance()->getVisibleMemoListN();
 	std::string quick = list->getItem(0)->getMemoUUID();
 	delete list;
-	std::string normal = addMemo(MemoSpec("Normal", "text"));
-	std::string hidden = addMemo(MemoSpec("Hidden", "text").hidden());
-	std::string deleted = addMemo(MemoSpec("Deleted", "text"));
+	std::string normal = addMemo(TestMemo("Normal", "text"));
+	std::string hidden = addMemo(TestMemo("Hidden", "text").hidden());
+	std::string deleted = addMemo(TestMemo("Deleted", "text"));
 	MemoDbMgr::getInstance()->excuteSql("UPDATE memo SET isDeleted = 1 WHERE UUID = '%q'", deleted.c_str());
 	const std::vector<std::string> visible = {quick, normal};
 	const std::vector<std::string> all = {quick, hidden, normal};
@@ -216,7 +216,7 @@ TEST_F(GridTest, eachGridModeReadsItsRows)
 TEST_F(GridTest, rotationKeepsTheScrollPosition)
 {
 	for (int i = 0; i < 60; ++i)
-		addMemo(MemoSpec("Memo " + std::to_string(i), "line"));
+		addMemo(TestMemo("Memo " + std::to_string(i), "line"));
 	makeGrid();
 	Evas_Object *gengrid = grid->getEvasObj();
 	// Scrolled by the user: each step raises the grid's "scroll".
@@ -229,7 +229,7 @@ TEST_F(GridTest, rotationKeepsTheScrollPosition)
 	ASSERT_EQ(700, y);
 
 	gIsPortrait = 0;
-	evas_object_resize(win, 800, 480);
+	resizeWindow(800, 480);
 	grid->updateGrid(true);
 	render();
 	grid->restoreScrollPosition();

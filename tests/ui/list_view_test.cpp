@@ -86,7 +86,7 @@ TEST_F(ListViewTest, emptyStoreShowsEmptyStateThenTheNewMemoAfterTheEditor)
 	tapFloatingButton();
 	EXPECT_TRUE(openedEditorOn(""));
 	std::string uuid;
-	coverAndComeBack([&] { uuid = addMemo(MemoSpec("Groceries", "milk")); });
+	coverAndComeBack([&] { uuid = addMemo(TestMemo("Groceries", "milk")); });
 	ASSERT_NE(nullptr, gengrid());
 	EXPECT_EQ(1, listView()->getGridItemCount());
 	EXPECT_EQ(1u, elm_gengrid_items_count(gengrid()));
@@ -104,7 +104,7 @@ TEST_F(ListViewTest, emptyStoreShowsEmptyStateThenTheNewMemoAfterTheEditor)
 
 TEST_F(ListViewTest, syncIdleAfterAnotherWriterReloadsTheList)
 {
-	addMemo(MemoSpec("First", "one"));
+	addMemo(TestMemo("First", "one"));
 	startApp();
 	ASSERT_EQ(2, listView()->getGridItemCount()); // the quick memo and the first memo
 
@@ -153,7 +153,7 @@ TEST_F(ListViewTest, moreMenuOffersDeleteAndSearchOnlyWithMemos)
 	EXPECT_NE(std::string::npos, logSince().find("There is no memo. More button skipped."));
 	EXPECT_EQ(nullptr, listView()->getPopup());
 
-	coverAndComeBack([] { addMemo(MemoSpec("Plan", "steps")); });
+	coverAndComeBack([] { addMemo(TestMemo("Plan", "steps")); });
 	pressKey("F2");
 	ASSERT_NE(nullptr, listView()->getPopup());
 	EXPECT_STREQ("WMenuPopupController", listView()->getPopup()->getClassName());

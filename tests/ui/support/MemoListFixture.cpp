@@ -64,40 +64,29 @@ void resetStore()
 		vconf_unset(key);
 }
 
-std::string addMemo(const MemoSpec &spec)
+std::string addMemo(const TestMemo &memo)
 {
 	MemoDocInfo *info = new MemoDocInfo();
 	// Titles come from the editor as markup.
-	char *title = elm_entry_utf8_to_markup(spec.title.c_str());
+	char *title = elm_entry_utf8_to_markup(memo.title.c_str());
 	info->setTitle(title);
 	free(title);
-	info->setDisplayContent(spec.display.c_str());
-	info->setStrippedContent(spec.display.c_str());
-	std::string document = spec.tizenXml;
-	if (document.empty() && !spec.display.empty())
+	info->setDisplayContent(memo.display.c_str());
+	info->setStrippedContent(memo.display.c_str());
+	std::string document = memo.tizenXml;
+	if (document.empty() && !memo.display.empty())
 		document = "<todolist></todolist>";
 	info->setTizenXmlContent(document.c_str());
-	info->setVrfileUUID(spec.voiceUuid.c_str());
-	info->setData(spec.thumbnail.c_str());
-	if (!spec.bgColor.empty())
-		info->setBgColor(spec.bgColor.c_str());
-	info->setIsFavorite(spec.isFavourite);
-	info->setIsHidden(spec.isHidden);
+	info->setVrfileUUID(memo.voiceUuid.c_str());
+	info->setData(memo.thumbnail.c_str());
+	if (!memo.bgColor.empty())
+		info->setBgColor(memo.bgColor.c_str());
+	info->setIsFavorite(memo.isFavourite);
+	info->setIsHidden(memo.isHidden);
 	gLastModified += 1000;
 	info->setCreatedAt(gLastModified);
 	info->setLastModifiedAt(gLastModified);
 	std::string uuid = info->getMemoUUID();
-	info->setFileCount(static_cast<int>(spec.files.size()));
-	for (size_t i = 0; i < spec.files.size(); ++i) {
-		MemoFileInfo &file = info->getFiles()[i];
-		char *fileUuid = nullptr;
-		MemoUtil::createUUIDN(&fileUuid);
-		file.setFileUUID(fileUuid);
-		free(fileUuid);
-		file.setMemoUUID(uuid.c_str());
-		file.setMimeType("image/png");
-		file.setPath(spec.files[i].c_str());
-	}
 	EXPECT_TRUE(MemoDbMgr::getInstance()->addMemo(info));
 	delete info;
 	return uuid;
@@ -117,7 +106,7 @@ void GridFixture::SetUp()
 	elm_app_base_scale_set(2.6);
 	gIsPortrait = 1;
 	resetStore();
-	evas_object_resize(win, 480, 800);
+	resizeWindow(480, 800);
 }
 
 void GridFixture::TearDown()
@@ -125,6 +114,12 @@ void GridFixture::TearDown()
 	grid = nullptr;
 	UiFixture::TearDown();
 	MemoDbMgr::destroy();
+}
+
+void GridFixture::resizeWindow(int w, int h)
+{
+	evas_sync(evas());
+	evas_object_resize(win, w, h);
 }
 
 MemoGridControl *GridFixture::makeGrid(int *mode)
@@ -167,6 +162,7 @@ void ListViewFixture::SetUp()
 {
 	UiFixture::SetUp();
 	// The app makes its own window; the helpers of UiFixture act on that one.
+	evas_sync(evas());
 	evas_object_del(win);
 	win = scroller = nullptr;
 	// As the platform sets the device language: C.UTF-8, under which gettext honours LANGUAGE.
@@ -179,6 +175,7 @@ void ListViewFixture::SetUp()
 void ListViewFixture::TearDown()
 {
 	if (app) {
+		evas_sync(evas());
 		app->onTerminate();
 		delete app;
 		app = nullptr;

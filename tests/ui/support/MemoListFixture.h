@@ -20,27 +20,21 @@ class MemoListView;
 namespace memo_ui_test
 {
 
-// A memo as it is written to the store: MemoSpec("title", "display").voice("vr-1").favourite().
-struct MemoSpec {
-	explicit MemoSpec(std::string memoTitle = "", std::string memoDisplay = "")
+// A memo as it is written to the store: TestMemo("title", "display").voice("vr-1").favourite().
+struct TestMemo {
+	explicit TestMemo(std::string memoTitle = "", std::string memoDisplay = "")
 	    : title(std::move(memoTitle)), display(std::move(memoDisplay))
 	{
 	}
-	MemoSpec &voice(const std::string &uuid) { return set(voiceUuid, uuid); }
-	MemoSpec &picture(const std::string &path) { return set(thumbnail, path); }
-	MemoSpec &color(const std::string &text) { return set(bgColor, text); }
-	MemoSpec &document(const std::string &xml) { return set(tizenXml, xml); }
-	MemoSpec &file(const std::string &path)
-	{
-		files.push_back(path);
-		return *this;
-	}
-	MemoSpec &favourite()
+	TestMemo &voice(const std::string &uuid) { return set(voiceUuid, uuid); }
+	TestMemo &picture(const std::string &path) { return set(thumbnail, path); }
+	TestMemo &color(const std::string &text) { return set(bgColor, text); }
+	TestMemo &favourite()
 	{
 		isFavourite = 1;
 		return *this;
 	}
-	MemoSpec &hidden()
+	TestMemo &hidden()
 	{
 		isHidden = 1;
 		return *this;
@@ -51,13 +45,12 @@ struct MemoSpec {
 	std::string tizenXml; // a non-empty display gets a stand-in document when this stays empty
 	std::string voiceUuid;
 	std::string thumbnail;
-	std::vector<std::string> files; // paths of file rows
 	std::string bgColor;
 	int isFavourite = 0;
 	int isHidden = 0;
 
 private:
-	MemoSpec &set(std::string &field, const std::string &value)
+	TestMemo &set(std::string &field, const std::string &value)
 	{
 		field = value;
 		return *this;
@@ -69,7 +62,7 @@ std::string checkLines(const std::vector<std::string> &lines);
 
 // Store helpers: every test starts from no database, no media and the feature keys unset.
 void resetStore();
-std::string addMemo(const MemoSpec &spec);
+std::string addMemo(const TestMemo &memo);
 std::string dataPath();
 
 class GridFixture : public UiFixture
@@ -78,6 +71,9 @@ protected:
 	void SetUp() override;
 	void TearDown() override;
 
+	// Resizes the window once the canvas has finished drawing: the buffer engine's render thread must not
+	// draw into a buffer that the resize replaces.
+	void resizeWindow(int w, int h);
 	// A grid of the given mode (null: the main list) filling the window, updated once.
 	MemoGridControl *makeGrid(int *mode = nullptr);
 	// The card at index after a render, null past the end.
