@@ -112,7 +112,7 @@ TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharactersAn
 	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), desktop_toast_log_get(0));
 }
 
-TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
+TEST_F(EntryFilterTest, TagsAreMendedForbiddenSourcesGoOnlyInFrontAndTheCountIsLimited)
 {
 	const std::string base = ghostOpen("file:///nowhere/a.png");
 	EXPECT_EQ(base + "></item>x", insert(base + ">x"));
@@ -126,10 +126,8 @@ TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
 	EXPECT_EQ("a" + good + "b", insert("a" + web + data + good + "b"));
 	// Behind a good tag the walk has stopped: this one survives the step.
 	EXPECT_EQ(good + web, insert(good + web));
-}
 
-TEST_F(EntryFilterTest, ImageCountLimits)
-{
+	// The limit of ten pictures, against the count of the memo's other items.
 	std::string twelve;
 	for (int i = 0; i < 12; i++)
 		twelve += ghostTag(i);
