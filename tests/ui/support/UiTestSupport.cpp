@@ -12,23 +12,19 @@
 namespace memo_ui_test
 {
 
-void initUi()
-{
-	static bool ready = false;
-	if (ready)
-		return;
-	static char arg0[] = "memo-ui-test";
-	static char *argv[] = {arg0, nullptr};
-	elm_init(1, argv);
-	elm_theme_extension_add(nullptr, MemoUtil::getEdjePath());
-	// Long presses in tests should not take a second each.
-	elm_config_longpress_timeout_set(0.3);
-	ready = true;
-}
-
 void UiFixture::SetUp()
 {
-	initUi();
+	// Elementary and the app's theme, once per process.
+	static const bool ready = [] {
+		static char arg0[] = "memo-ui-test";
+		static char *argv[] = {arg0, nullptr};
+		elm_init(1, argv);
+		elm_theme_extension_add(nullptr, MemoUtil::getEdjePath());
+		// Long presses in tests should not take a second each.
+		elm_config_longpress_timeout_set(0.3);
+		return true;
+	}();
+	(void)ready;
 	// As the app sets it: layout sizes are given for a scale of 2.6.
 	elm_app_base_scale_set(2.6);
 	win = elm_win_add(nullptr, "memo-ui-test", ELM_WIN_BASIC);

@@ -16,9 +16,6 @@
 namespace memo_ui_test
 {
 
-// Elementary and the app's theme, once per process. Safe to call again.
-void initUi();
-
 // A window of 720 x 1280 with a background and a scroller, at the app's scale; tests may change the
 // scale.
 class UiFixture : public ::testing::Test
