@@ -57,6 +57,10 @@ private:
 	app_assist::WNaviframeController *__getNaviframe() const;
 	app_assist::WContentViewController *__getTopView() const;
 	void __saveOpenEditor();
+	// The one page the process begins with, for the first launch request.
+	void __pushFirstView(app_control_s *request, const char *operation);
+	// The first page of a launch that shows the list: plainly, or answering a pick request.
+	void __pushListView(app_control_s *request, const char *operation);
 
 	static void __bindTextDomains();
 	static char *__getResourcePathN(const char *resourceId);

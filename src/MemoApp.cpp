@@ -21,6 +21,7 @@
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
 #include "Model/MemoPopupMonitor.h"
+#include "View/MemoEditView.h"
 
 using app_assist::WContentViewController;
 using app_assist::WNaviframeController;
@@ -49,7 +50,8 @@ MemoApp::MemoApp() : __colorTable(nullptr), __fontTable(nullptr), __openedInfo(n
 MemoApp::~MemoApp()
 {
 	MEMO_LOGD("~MemoApp");
-	MemoDbMgr::getInstance();
+	// Only a close: asking for the instance here would open (on a first run even create) a database that was
+	// never opened or is closed already, just to close it again.
 	MemoDbMgr::destroy();
 	delete __openedInfo;
 	__openedInfo = nullptr;
@@ -248,7 +250,10 @@ void MemoApp::__saveOpenEditor()
 	const char *className = top ? top->getClassName() : nullptr;
 	if (!className || strcmp(className, "MemoEditView"))
 		return;
-	MEMO_LOGI("MemoEditView is open at exit");
+	// The name says which page it is; the cast makes sure of the type before the call.
+	MemoEditView *editView = dynamic_cast<MemoEditView *>(top);
+	if (editView && !editView->isDiscarded())
+		editView->saveOnExit();
 }
 
 // The views name the domains "memo" and "memo-sub" for their translatable texts; both are catalogues of the

@@ -21,7 +21,10 @@ static void __clearButtonUpdate(Evas_Object *entry)
 	Evas_Object *button = evas_object_data_get(entry, CLEAR_BUTTON_KEY);
 	if (!button)
 		return;
-	Eina_Bool show = !elm_entry_is_empty(entry) && elm_entry_editable_get(entry) && elm_object_focus_get(entry);
+	/* Not elm_entry_is_empty: inside "changed" it moves the cursor to where the pending change began, so
+	   that every typed character would land at the same place. */
+	const char *text = elm_entry_entry_get(entry);
+	Eina_Bool show = text && *text && elm_entry_editable_get(entry) && elm_object_focus_get(entry);
 	if (elm_object_part_content_get(entry, "elm.swallow.clear") == button) {
 		if (show)
 			evas_object_show(button);

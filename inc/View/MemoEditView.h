@@ -1,0 +1,190 @@
+#ifndef INC_VIEW_MEMOEDITVIEW_H
+#define INC_VIEW_MEMOEDITVIEW_H
+
+#include <app_control.h>
+#include <call-manager.h>
+
+#include <Elementary.h>
+#include <WContentViewController.h>
+
+#include "Box/MemoBoxControl.h"
+
+class MemoDocInfo;
+class MemoFileInfo;
+class MemoPlayer;
+class MemoRecorder;
+
+// The screen on which a memo is read, written and changed: a page of the naviframe holding the memo's
+// box control in a scroller over the memo's colour, with Cancel and Done in the title bar while editing.
+// A memo with a record opens read only (MODE_VIEW); a tap under its text or on it turns it into an edit
+// (MODE_UPDATE). A new memo starts in MODE_NEW, or MODE_NEW_EXTERNAL when another app asked for it.
+//
+// Files: MemoEditView.cpp (construction, push, teardown, public operations), MemoEditViewLayout.cpp (contents,
+// title bar, taps, modes, box signals), MemoEditViewEvents.cpp (rotation, broadcasts, calls),
+// MemoEditViewSave.cpp (change detection and the write), MemoEditViewFiles.cpp (file rows, thumbnail, media
+// folder), MemoEditViewPopups.cpp (Cancel, back, discard, storage and delete popups), MemoEditViewMenu.cpp
+// (more menu and colour selector), MemoEditViewVoice.cpp (what the voice panels will need).
+class MemoEditView : public app_assist::WContentViewController
+{
+public:
+	// `info` is not owned and may be null (a new memo). With a record the view reads it (MODE_VIEW) and
+	// `external` is ignored; without one `external` picks MODE_NEW_EXTERNAL over MODE_NEW.
+	// `immediateLayout` builds the contents a second time at once instead of on an idler.
+	MemoEditView(MemoDocInfo *info, bool external, bool immediateLayout);
+
+	const char *getClassName() const override;
+
+protected:
+	// The page layout (group "edit_view") with the more and back keys on it; null with "parent object is
+	// NULL".
+	Evas_Object *onCreateView(Evas_Object *parent, void *param) override;
+	void onDestroy() override;
+
+public:
+	~MemoEditView() override;
+
+	void onPushed(Elm_Object_Item *naviItem) override;
+
+	// 1 when opened from the hidden memos.
+	void setHiddenMode(int isHiddenMode);
+	// The record the view was opened with (not owned); null with the info line "Doc info is NULL".
+	MemoDocInfo *getCurrentDocInfo();
+	// Inserts markup into the focused body item, or into the title item. Always true.
+	bool insertTextToBody(const char *text);
+	bool insertTextToTitle(const char *text);
+	// A picture handed in by a launch request. Always true.
+	bool insertImage(const char *path);
+	// Whether the user chose Discard.
+	bool isDiscarded() const { return __isDiscarded; }
+	// The save at application exit: stops a recording and writes the memo, changed or not; nothing in
+	// MODE_VIEW. A failed write is logged.
+	void saveOnExit();
+
+	// Rows of the memo colours, red, green, blue and alpha.
+	static const int PALETTE_SIZE = 7;
+
+private:
+	MemoEditView(const MemoEditView &) = delete;
+	MemoEditView &operator=(const MemoEditView &) = delete;
+
+	// ---- Layout and modes (MemoEditViewLayout.cpp) ----
+	void __createContentsLayout(Evas_Object *parent);
+	void __takeBaseline();
+	void __onScrollerMouseUp(int x, int y);
+	void __changeToUpdateMode();
+	void __createTitleBar();
+	void __updateDoneBtnStatus(bool enable);
+	void __updateAudioBtnStatus(bool enable);
+	void __onBoxSignal(const char *signal, void *data);
+	void __showProcessingPopup();
+	void __focusEntry(bool showKeypad);
+	// The palette row equal to the four values, 0 when none is.
+	int __findPaletteIndex(int red, int green, int blue, int alpha) const;
+	static void __scrollerMouseDownCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo);
+	static void __scrollerMouseUpCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo);
+	static void __processingPopupDelCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo);
+	static void __titleBtnDelCb(void *data, Evas *e, Evas_Object *obj, void *eventInfo);
+	// The title buttons and the processing popup may outlive the page: they lose their way back to it.
+	void __releaseOutsideObjects();
+
+	// ---- Rotation, broadcasts, calls (MemoEditViewEvents.cpp) ----
+	void __updateRotationSignal();
+	void __onBroadcast(const char *key);
+	// New string: the record's date of change as the device writes dates; null without a record.
+	char *__getTimeTextN();
+	void __registerCallStatus();
+	void __onCallStatusChanged(cm_call_status_e status);
+	static void __callStatusCb(cm_call_status_e status, const char *number, void *data);
+
+	// ---- Saving (MemoEditViewSave.cpp, MemoEditViewFiles.cpp) ----
+	bool __isChanged();
+	bool __isRecorderUpdated();
+	static void __doneBtnCb(void *data, Evas_Object *obj, void *eventInfo);
+	// Writes the memo. False only when the store refused the write (the editor then stays open).
+	bool __saveMemo();
+	bool __writeRecord(MemoDocInfo *record);
+	void __onSaveFailed();
+	// Adds the voice and image rows to `record` and tidies the media folder.
+	void __collectFiles(MemoDocInfo *record, Eina_List *images, const char *title);
+	bool __fillFileInfo(MemoFileInfo *file, const char *fileUUID, const char *mime, const char *path);
+	void __refreshMediaFolder(Eina_List *images);
+	bool __createThumbnail(const char *path, bool hasTitle);
+
+	// ---- Leaving (MemoEditViewPopups.cpp) ----
+	bool __isTop() const;
+	void __popOutLater(bool removeMedia);
+	static void __cancelBtnCb(void *data, Evas_Object *obj, void *eventInfo);
+	static void __backBtnCb(void *data, Evas_Object *obj, void *eventInfo);
+	void __createDiscardPopup();
+	void __discard();
+	void __createStorageFullPopup();
+	void __createDeletePopup();
+	static void __launchStorageSettings();
+
+	// ---- More menu and colours (MemoEditViewMenu.cpp) ----
+	static void __moreBtnCb(void *data, Evas_Object *obj, void *eventInfo);
+	void __createMoreMenu();
+	void __createColorSelector();
+	void __closeColorSelector(bool focus);
+	static void __colorSelectedCb(void *data, Evas_Object *obj, void *eventInfo);
+
+	// ---- Voice (MemoEditViewVoice.cpp) ----
+	// True while a recorder holds a recording handle, that is while it records.
+	bool __isRecording() const;
+	// Stops the recording for a save; false when it stayed under one second and is not kept.
+	bool __stopRecording();
+	// The voice panel is free: no live player, and no recorder or a finished one.
+	bool __isVoicePanelFree() const;
+	void __deleteRecorder();
+	void __destroyPlayer();
+	void __createPlayer(bool withDeleteButton);
+	char *__getVrPathN(const char *uuid);
+	void __destroyAttachPanel();
+
+	MemoBoxControl *__boxControl;
+	MemoPlayer *__player;
+	Evas_Object *__scroller;
+	MemoDocInfo *__info;
+	MemoRecorder *__recorder;
+	int __isPlayerDeleted;
+	int __isRecorderDeleted;
+	int __isNewHidden;
+	char *__UUID;
+	char *__vrUUID;
+	char *__mediaPath;
+	char *__thumbPath;
+	const char *__displayContent;
+	int __mode;
+	Evas_Object *__cancelBtn;
+	Evas_Object *__doneBtn;
+	Evas_Object *__audioBtn; // never created: the more menu starts recordings
+	Evas_Object *__colorSelector;
+	Evas_Object *__bgObject;
+	Evas_Object *__processingPopup;
+	char *__imagePath;
+	int __imageWidth;
+	int __imageHeight;
+	int __imageScale;
+	int __isHiddenMode;
+	Ecore_Thread *__threadHandle; // the last image worker ("__thread" is a compiler keyword)
+	int __isPortrait;
+	cm_client_h __callHandle;
+	bool __canSave;
+	bool __isLaunching;
+	char *__viewerCopyPath;
+	Evas_Object *__viewerPopup; // nothing sets it
+	int __downX;
+	int __downY;
+	int __colorIndex;
+	int __palette[PALETTE_SIZE][4];
+	bool __isImmediateLayout;
+	void *__attachPanel; // no flow opens the attach panel
+	app_control_h __attachResult;
+	Eina_List *__attachedPaths;
+	bool __isAppPaused;
+	bool __isDiscarded;
+	// A failed write was reported: the next save of a new memo checks whether its row exists after all.
+	bool __saveFailed;
+};
+
+#endif
