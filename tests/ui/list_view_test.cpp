@@ -128,11 +128,11 @@ TEST_F(ListViewTest, storageBelowTheLimitGivesThePopupOrAToast)
 
 	// In power saving a status message stands for the popup.
 	vconf_set_int("db/setting/psmode", 1);
-	clearToasts();
+	desktop_toast_log_clear();
 	tapFloatingButton();
 	EXPECT_FALSE(MemoPopupMonitor::getInstance()->isPopupAlive());
-	ASSERT_EQ(1, toastCount());
-	EXPECT_EQ("Not enough space in phone storage.", toastAt(0));
+	ASSERT_EQ(1, desktop_toast_log_count());
+	EXPECT_STREQ("Not enough space in phone storage.", desktop_toast_log_get(0));
 }
 
 TEST_F(ListViewTest, moreMenuOffersDeleteAndSearchOnlyWithMemos)

@@ -168,7 +168,7 @@ void ListViewFixture::SetUp()
 	UiFixture::SetUp();
 	// The app makes its own window; the helpers of UiFixture act on that one.
 	evas_object_del(win);
-	win = scroller = box = nullptr;
+	win = scroller = nullptr;
 	// As the platform sets the device language: C.UTF-8, under which gettext honours LANGUAGE.
 	setenv("LANGUAGE", "en", 1);
 	setlocale(LC_MESSAGES, "C.UTF-8");

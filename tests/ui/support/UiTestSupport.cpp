@@ -12,9 +12,8 @@
 namespace memo_ui_test
 {
 
-void UiFixture::SetUp()
+void initUi()
 {
-	// Elementary and the app's theme, once per process.
 	static const bool ready = [] {
 		static char arg0[] = "memo-ui-test";
 		static char *argv[] = {arg0, nullptr};
@@ -25,6 +24,11 @@ void UiFixture::SetUp()
 		return true;
 	}();
 	(void)ready;
+}
+
+void UiFixture::SetUp()
+{
+	initUi();
 	// As the app sets it: layout sizes are given for a scale of 2.6.
 	elm_app_base_scale_set(2.6);
 	win = elm_win_add(nullptr, "memo-ui-test", ELM_WIN_BASIC);
@@ -127,8 +131,9 @@ void UiFixture::typeText(const char *text)
 {
 	for (const char *p = text; *p; p++) {
 		const char typed[2] = {*p, '\0'};
-		evas_event_feed_key_down(evas(), typed, typed, typed, typed, ++__timestamp, nullptr);
-		evas_event_feed_key_up(evas(), typed, typed, typed, typed, ++__timestamp, nullptr);
+		const char *key = *p == ' ' ? "space" : *p == '.' ? "period" : *p == ',' ? "comma" : typed;
+		evas_event_feed_key_down(evas(), key, key, typed, typed, ++__timestamp, nullptr);
+		evas_event_feed_key_up(evas(), key, key, typed, typed, ++__timestamp, nullptr);
 	}
 	runFor(0.03);
 }
@@ -137,6 +142,12 @@ void UiFixture::mouseDown(int x, int y)
 {
 	evas_event_feed_mouse_move(evas(), x, y, ++__timestamp, nullptr);
 	evas_event_feed_mouse_down(evas(), 1, EVAS_BUTTON_NONE, ++__timestamp, nullptr);
+	runFor(0.02);
+}
+
+void UiFixture::mouseMove(int x, int y)
+{
+	evas_event_feed_mouse_move(evas(), x, y, ++__timestamp, nullptr);
 	runFor(0.02);
 }
 

@@ -16,6 +16,9 @@
 namespace memo_ui_test
 {
 
+// Elementary and the app's theme, once per process. Safe to call again.
+void initUi();
+
 // A window of 720 x 1280 with a background and a scroller, at the app's scale; tests may change the
 // scale.
 class UiFixture : public ::testing::Test
@@ -36,11 +39,12 @@ protected:
 
 	// One key press and release (`string` is what the key types, null for none), then the handlers run.
 	void pressKey(const char *keyName, const char *string = nullptr);
-	// Types ASCII letters and digits, one key press each.
+	// Types ASCII text, one key press per character.
 	void typeText(const char *text);
 
 	// Pointer events at canvas coordinates; each lets the handlers run.
 	void mouseDown(int x, int y);
+	void mouseMove(int x, int y);
 	void mouseUp(int x, int y);
 	// Down and up at one point, or at the centre of an object.
 	void tap(int x, int y);
