@@ -61,8 +61,7 @@ void secondCb(keynode_t *node, void *data)
 class VconfNotify : public testing::Test
 {
 protected:
-	void SetUp() override { ecore_init(); }
-	void TearDown() override { ecore_shutdown(); }
+	static void SetUpTestSuite() { ecore_init(); }
 
 	static int vconftool(const std::string &args, std::string *out = nullptr)
 	{

@@ -17,14 +17,6 @@ using namespace memo_ui_test;
 
 using BoxControlDocumentTest = BoxControlFixture;
 
-namespace
-{
-int countInLog(const std::string &needle)
-{
-	return memo_test::countOf(memo_test::readFile(std::string(MemoUtil::getDataPath()) + "dlog.log"), needle);
-}
-} // namespace
-
 TEST_F(BoxControlDocumentTest, NewOrUnreadableMemoIsATitleAndOneFirstTextItem)
 {
 	makeControl(nullptr, MODE_NEW);
@@ -147,7 +139,11 @@ TEST_F(BoxControlDocumentTest, ViewModeItemsAreReadOnlyAndAnEmptyQuickMemoHasAQu
 		description.replace(at, 1, "<br/>");
 	MemoBroadCaster::Signal &bus = MemoBroadCaster::getInstance();
 	const size_t listeners = bus.getListenerCount();
-	const int complaints = countInLog("Already removed listener");
+	auto complaints = [] {
+		return memo_test::countOf(memo_test::readFile(std::string(MemoUtil::getDataPath()) + "dlog.log"),
+		                          "Already removed listener");
+	};
+	const size_t before = complaints();
 	record.setIsQuick(1);
 	record.setTizenXmlContent("");
 	remakeControl(&record, MODE_VIEW);
@@ -167,5 +163,5 @@ TEST_F(BoxControlDocumentTest, ViewModeItemsAreReadOnlyAndAnEmptyQuickMemoHasAQu
 	EXPECT_EQ(listeners + 1, bus.getListenerCount());
 	UiFixture::TearDown();
 	EXPECT_EQ(listeners, bus.getListenerCount());
-	EXPECT_EQ(complaints, countInLog("Already removed listener"));
+	EXPECT_EQ(before, complaints());
 }

@@ -15,7 +15,7 @@ using namespace memo_ui_test;
 
 using BoxControlItemsTest = BoxControlFixture;
 
-TEST_F(BoxControlItemsTest, AllBodyItemsShareOneBudget)
+TEST_F(BoxControlItemsTest, AllBodyItemsShareOneBudgetAndDoneFollowsThemAndInNewMemosTheTitle)
 {
 	withBody(todoItem(0, false, std::string(4000, 'a')) + todoItem(0, false, ""));
 	MemoBoxItem *big = items()[0];
@@ -44,11 +44,9 @@ TEST_F(BoxControlItemsTest, AllBodyItemsShareOneBudget)
 	focus(control->getTitleItem()->getEntry());
 	typeText("Title");
 	EXPECT_EQ("Title", titleText());
-}
 
-TEST_F(BoxControlItemsTest, DoneFollowsTheBodyAndInNewModesTheTitle)
-{
-	makeControl(nullptr, MODE_NEW);
+	// Done follows the body, and in a new memo the title as well.
+	remakeControl(nullptr, MODE_NEW);
 	focus(items()[0]->getEntry());
 	typeText("hi");
 	EXPECT_EQ("action,done,enable", lastKey());

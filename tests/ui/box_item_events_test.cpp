@@ -8,15 +8,6 @@ using namespace memo_ui_test;
 
 using BoxItemEventsTest = BoxControlFixture;
 
-namespace
-{
-// Records what the filters before it let through.
-void recordFilteredCb(void *data, Evas_Object *, char **text)
-{
-	static_cast<std::vector<std::string> *>(data)->push_back(*text ? *text : "(null)");
-}
-} // namespace
-
 TEST_F(BoxItemEventsTest, TitleTakesOneLineOf128CharactersWithoutFormat)
 {
 	makeControl(nullptr, MODE_NEW);
@@ -30,7 +21,13 @@ TEST_F(BoxItemEventsTest, TitleTakesOneLineOf128CharactersWithoutFormat)
 	// Composition text is left alone; without its closing tag it is plain input: the tags go, the entity stays.
 	elm_entry_entry_set(title->getEntry(), "");
 	std::vector<std::string> seen;
-	elm_entry_markup_filter_append(title->getEntry(), recordFilteredCb, &seen);
+	// A filter behind the title's records what the title's filter let through.
+	elm_entry_markup_filter_append(
+	    title->getEntry(),
+	    [](void *data, Evas_Object *, char **text) {
+		    static_cast<std::vector<std::string> *>(data)->push_back(*text ? *text : "(null)");
+	    },
+	    &seen);
 	elm_entry_entry_insert(title->getEntry(), "<preedit><b>a</b>&amp;</preedit>");
 	elm_entry_entry_insert(title->getEntry(), "<preedit><b>a</b>&amp;");
 	EXPECT_EQ((std::vector<std::string>{"<preedit><b>a</b>&amp;</preedit>", "a&amp;"}), seen);

@@ -7,20 +7,7 @@
 
 using namespace memo_ui_test;
 
-namespace
-{
-class BoxItemKeysTest : public BoxControlFixture
-{
-protected:
-	// BackSpace at the start of the item: the first press only notes the cursor at 0, the second acts.
-	void backSpaceAtStart(MemoBoxItem *item)
-	{
-		focusAt(item, 0);
-		pressKey("BackSpace", "\b");
-		pressKey("BackSpace", "\b");
-	}
-};
-} // namespace
+using BoxItemKeysTest = BoxControlFixture;
 
 TEST_F(BoxItemKeysTest, ReturnOnEachKindOfLine)
 {
@@ -110,6 +97,12 @@ TEST_F(BoxItemKeysTest, BackSpaceTurnsCheckLinesIntoTextThenMergesKeepingEveryth
 	EXPECT_EQ("5:firstmilk 0:", shape());
 	EXPECT_EQ(5, elm_entry_cursor_pos_get(items()[0]->getEntry()));
 
+	// BackSpace at the start of an item: the first press only notes the cursor at 0, the second acts.
+	auto backSpaceAtStart = [this](MemoBoxItem *item) {
+		focusAt(item, 0);
+		pressKey("BackSpace", "\b");
+		pressKey("BackSpace", "\b");
+	};
 	// The first item merges into the next one, which takes over the head.
 	withBody(todoItem(0, false, "one") + todoItem(1, true, "two") + todoItem(0, false, std::string(2500, 'a')) +
 	         todoItem(0, false, std::string(1500, 'b')));

@@ -23,7 +23,6 @@ protected:
 		BoxControlFixture::SetUp();
 		makeControl(nullptr, MODE_NEW);
 		target = items()[0];
-		folder = mediaDir();
 		elsewhere = std::string(MemoUtil::getDataPath()) + "media/other-memo/";
 		ecore_file_mkpath(elsewhere.c_str());
 	}
@@ -81,7 +80,7 @@ protected:
 	}
 
 	MemoBoxItem *target = nullptr;
-	std::string folder, elsewhere;
+	std::string elsewhere;
 	// A text line's picture width at the test scale, and the height of a tag whose file is missing.
 	const int width = 628, height = 428;
 };
@@ -112,7 +111,7 @@ TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharactersAn
 	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), desktop_toast_log_get(0));
 }
 
-TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
+TEST_F(EntryFilterTest, TagsAreMendedForbiddenSourcesGoOnlyInFrontAndTheCountIsLimited)
 {
 	const std::string base = ghostOpen("file:///nowhere/a.png");
 	EXPECT_EQ(base + "></item>x", insert(base + ">x"));
@@ -126,10 +125,8 @@ TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
 	EXPECT_EQ("a" + good + "b", insert("a" + web + data + good + "b"));
 	// Behind a good tag the walk has stopped: this one survives the step.
 	EXPECT_EQ(good + web, insert(good + web));
-}
 
-TEST_F(EntryFilterTest, ImageCountLimits)
-{
+	// The limit of ten pictures, against the count of the memo's other items.
 	std::string twelve;
 	for (int i = 0; i < 12; i++)
 		twelve += ghostTag(i);
@@ -157,7 +154,7 @@ TEST_F(EntryFilterTest, PicturesFromElsewhereAreTakenIntoTheMemoAndFitted)
 	const std::string source = elsewhere + "photo.png";
 	ASSERT_TRUE(writePicture(source, 200, 100));
 	const std::string path = pathOf(insert(fittedTag(source, 200, 100)));
-	ASSERT_EQ(0u, path.find(folder)) << shown();
+	ASSERT_EQ(0u, path.find(mediaDir())) << shown();
 	EXPECT_TRUE(eina_str_has_extension(path.c_str(), ".png"));
 	EXPECT_TRUE(ecore_file_exists(path.c_str()));
 	EXPECT_TRUE(ecore_file_exists(source.c_str()));
@@ -169,7 +166,7 @@ TEST_F(EntryFilterTest, PicturesFromElsewhereAreTakenIntoTheMemoAndFitted)
 	const std::string pasted = elsewhere + "pasted.jpg";
 	ASSERT_TRUE(writePicture(pasted, 300, 200));
 	const std::string copy = pathOf(insert("a<item absize=240x180 href=file://" + pasted + "></item>b"));
-	ASSERT_EQ(0u, copy.find(folder)) << shown();
+	ASSERT_EQ(0u, copy.find(mediaDir())) << shown();
 	EXPECT_TRUE(eina_str_has_extension(copy.c_str(), ".jpg"));
 	EXPECT_EQ("a" + fittedTag(copy, 300, 200) + "b", shown());
 	const std::string gone = "<item absize=240x180 href=file:///nowhere/gone.jpg></item>";
@@ -183,7 +180,7 @@ TEST_F(EntryFilterTest, LargePicturesAreShrunkOnWorkers)
 	const std::string big = elsewhere + "big.png";
 	ASSERT_TRUE(writePicture(big, 1000, 800));
 	const std::string copy = pathOf(insert(fittedTag(big, 1000, 800)));
-	ASSERT_EQ(0u, copy.find(folder)) << shown();
+	ASSERT_EQ(0u, copy.find(mediaDir())) << shown();
 	EXPECT_EQ(0, countKey("action,imagepopup,show"));
 	int w = 0, h = 0;
 	ASSERT_TRUE(waitFor([&] { return pictureSize(copy, &w, &h) && w * h <= 320000; }, 20.0));

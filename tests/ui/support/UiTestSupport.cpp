@@ -14,16 +14,16 @@ namespace memo_ui_test
 
 void initUi()
 {
-	static bool ready = false;
-	if (ready)
-		return;
-	static char arg0[] = "memo-ui-test";
-	static char *argv[] = {arg0, nullptr};
-	elm_init(1, argv);
-	elm_theme_extension_add(nullptr, MemoUtil::getEdjePath());
-	// Long presses in tests should not take a second each.
-	elm_config_longpress_timeout_set(0.3);
-	ready = true;
+	static const bool ready = [] {
+		static char arg0[] = "memo-ui-test";
+		static char *argv[] = {arg0, nullptr};
+		elm_init(1, argv);
+		elm_theme_extension_add(nullptr, MemoUtil::getEdjePath());
+		// Long presses in tests should not take a second each.
+		elm_config_longpress_timeout_set(0.3);
+		return true;
+	}();
+	(void)ready;
 }
 
 void UiFixture::SetUp()
@@ -131,8 +131,9 @@ void UiFixture::typeText(const char *text)
 {
 	for (const char *p = text; *p; p++) {
 		const char typed[2] = {*p, '\0'};
-		evas_event_feed_key_down(evas(), typed, typed, typed, typed, ++__timestamp, nullptr);
-		evas_event_feed_key_up(evas(), typed, typed, typed, typed, ++__timestamp, nullptr);
+		const char *key = *p == ' ' ? "space" : *p == '.' ? "period" : *p == ',' ? "comma" : typed;
+		evas_event_feed_key_down(evas(), key, key, typed, typed, ++__timestamp, nullptr);
+		evas_event_feed_key_up(evas(), key, key, typed, typed, ++__timestamp, nullptr);
 	}
 	runFor(0.03);
 }

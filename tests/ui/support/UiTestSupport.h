@@ -39,7 +39,7 @@ protected:
 
 	// One key press and release (`string` is what the key types, null for none), then the handlers run.
 	void pressKey(const char *keyName, const char *string = nullptr);
-	// Types ASCII letters and digits, one key press each.
+	// Types ASCII text, one key press per character.
 	void typeText(const char *text);
 
 	// Pointer events at canvas coordinates; each lets the handlers run.
