@@ -59,6 +59,17 @@ inline std::string setUpPrivateRoot(const char *name)
 	return tmpl;
 }
 
+// Path of a helper program of the tests: <build>/bench/bench_<name> -> <build>/tests/helpers/<helper>.
+inline std::string helperPath(const char *helper)
+{
+	char exe[4096] = {};
+	const ssize_t len = readlink("/proc/self/exe", exe, sizeof(exe) - 1);
+	std::string dir(exe, len > 0 ? static_cast<size_t>(len) : 0);
+	dir = dir.substr(0, dir.rfind('/'));
+	dir = dir.substr(0, dir.rfind('/'));
+	return dir + "/tests/helpers/" + helper;
+}
+
 } // namespace memo_bench
 
 #endif

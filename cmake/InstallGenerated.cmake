@@ -3,8 +3,11 @@
 set(root "${CMAKE_INSTALL_PREFIX}/${MEMO_INSTALL_ROOT}")
 file(REMOVE_RECURSE "${MEMO_STAGE_DIR}")
 
-file(WRITE "${MEMO_STAGE_DIR}/apps/${MEMO_APP_ID}.ini"
-	"[app]\nid=${MEMO_APP_ID}\nexec=${root}/bin/memo\nroot=${root}\n")
+# The build's own entry (label, icon, operations, mime types from the manifest) with the installed paths.
+file(READ "${MEMO_BUILD_ENTRY}" entry)
+string(REGEX REPLACE "\nexec=[^\n]*" "\nexec=${root}/bin/memo" entry "${entry}")
+string(REGEX REPLACE "\nroot=[^\n]*" "\nroot=${root}" entry "${entry}")
+file(WRITE "${MEMO_STAGE_DIR}/apps/${MEMO_APP_ID}.ini" "${entry}")
 file(INSTALL "${MEMO_STAGE_DIR}/apps/${MEMO_APP_ID}.ini" DESTINATION "${root}/share/tizen-platform/apps")
 
 set(MEMO_OPEN "${root}/bin/memo-open")

@@ -6,6 +6,7 @@
 #include <cstdlib>
 #include <cstring>
 
+#include <Elementary.h>
 #include <app_control.h>
 
 #include <WContentViewController.h>
@@ -16,6 +17,7 @@
 #include "MemoLog.h"
 #include "Util/MemoUtil.h"
 #include "View/MemoEditView.h"
+#include "View/MemoListView.h"
 
 using app_assist::WContentViewController;
 using app_assist::WNaviframeController;
@@ -94,13 +96,21 @@ void MemoApp::__pushFirstView(app_control_s *request, const char *operation)
 	__pushListView(pick, request);
 }
 
-// The list's own place: a pick hands the list a clone of the request, which the list owns and answers.
-// Until the list is part of the app a new memo stands in for it, and a pick gets no answer.
+// A pick hands the list a clone of the request, which the list owns and answers; every other start shows
+// the list plainly.
 void MemoApp::__pushListView(bool pick, app_control_s *request)
 {
-	(void)pick;
-	(void)request;
-	__getNaviframe()->push(new MemoEditView(nullptr, false, false));
+	WNaviframeController *naviframe = __getNaviframe();
+	app_control_h pickRequest = nullptr;
+	if (!pick) {
+		naviframe->push(new MemoListView());
+	} else if (app_control_clone(&pickRequest, request) != APP_CONTROL_ERROR_NONE) {
+		MEMO_LOGE("the pick request cannot be kept");
+		naviframe->push(new MemoListView());
+	} else {
+		// The view owns the clone from its creation on, a failed push included.
+		naviframe->push(new MemoListView(), nullptr, &pickRequest);
+	}
 }
 
 void MemoApp::__addQuickMemoText(app_control_s *request)

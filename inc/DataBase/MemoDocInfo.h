@@ -1,6 +1,7 @@
 #ifndef INC_DATABASE_MEMODOCINFO_H
 #define INC_DATABASE_MEMODOCINFO_H
 
+#include <memory>
 #include <string>
 
 #include "DataBase/MemoFileInfo.h"
@@ -21,6 +22,8 @@ class MemoDocInfo
 public:
 	MemoDocInfo();
 	virtual ~MemoDocInfo();
+	MemoDocInfo(const MemoDocInfo &other);
+	MemoDocInfo &operator=(const MemoDocInfo &other);
 
 	// Stores the UUID; returns false in every case (no caller reads it).
 	bool setMemoUUID(const char *uuid);
@@ -84,9 +87,10 @@ public:
 	int getIsHidden() const { return __isHidden; }
 	int getIsQuick() const { return __isQuick; }
 	int getFileCount() const { return __fileCount; }
-	// The inline array of MEMO_MAX_FILE_COUNT entries; the used ones are the first getFileCount().
-	MemoFileInfo *getFiles() { return __files; }
-	const MemoFileInfo *getFiles() const { return __files; }
+	// The array of MEMO_MAX_FILE_COUNT entries; the used ones are the first getFileCount(). It is made on
+	// first use, so that the records of a list, whose files are never read, stay small.
+	MemoFileInfo *getFiles();
+	const MemoFileInfo *getFiles() const;
 	const char *getBgColor() const { return __bgColor.c_str(); }
 	// Writes the four colour ints through the out arguments (null ones are skipped).
 	void getBgColorRgba(int *red, int *green, int *blue, int *alpha) const;
@@ -116,7 +120,7 @@ private:
 	int __isHidden;
 	int __isQuick;
 	int __fileCount;
-	MemoFileInfo __files[MEMO_MAX_FILE_COUNT];
+	mutable std::unique_ptr<MemoFileInfo[]> __files;
 	int __bgRed;
 	int __bgGreen;
 	int __bgBlue;

@@ -1,12 +1,13 @@
 #ifndef INC_LIST_MEMOITEMLIST_H
 #define INC_LIST_MEMOITEMLIST_H
 
-#include <Eina.h>
+#include <vector>
 
 class MemoDocInfo;
 
 // The owning list of memo records that every list read of the store returns.
-// Deleting the list deletes its records.
+// Deleting the list deletes its records. Reading by index costs the same for every index, so
+// walking a list of ten thousand memos stays linear.
 class MemoItemList
 {
 public:
@@ -26,7 +27,7 @@ private:
 	MemoItemList &operator=(const MemoItemList &) = delete;
 	void __clearList();
 
-	Eina_List *__list;
+	std::vector<MemoDocInfo *> __list;
 };
 
 #endif

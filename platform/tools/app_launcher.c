@@ -2,7 +2,6 @@
 #include <Ecore.h>
 #include <app_control.h>
 #include <app_manager.h>
-#include <desktop/app_launch.h>
 #include <desktop/app_registry.h>
 
 #include <getopt.h>
@@ -11,7 +10,6 @@
 #include <string.h>
 
 #define DEFAULT_REPLY_TIMEOUT_SEC 10.0
-#define DELIVERY_TIMEOUT_SEC 5.0
 
 enum { EXIT_OK = 0, EXIT_FAILED = 1, EXIT_USAGE = 2 };
 
@@ -37,7 +35,7 @@ static const char *error_text(int err)
 	case APP_CONTROL_ERROR_LAUNCH_FAILED:
 		return "the app could not be started";
 	case APP_CONTROL_ERROR_TIMED_OUT:
-		return "the app did not answer in time";
+		return "the app did not take the request in time (stopped or hung?)";
 	case APP_CONTROL_ERROR_KEY_REJECTED:
 		return "the key is reserved";
 	case APP_CONTROL_ERROR_INVALID_PARAMETER:
@@ -149,10 +147,6 @@ static int send_request(app_control_h request, const char *app_id, bool want_rep
 		return EXIT_FAILED;
 	}
 	if (!want_reply) {
-		if (desktop_app_launch_drain(DELIVERY_TIMEOUT_SEC) != APP_CONTROL_ERROR_NONE) {
-			fprintf(stderr, "app_launcher: %s did not take the request\n", app_id);
-			return EXIT_FAILED;
-		}
 		printf("launch request sent to %s\n", app_id);
 		return EXIT_OK;
 	}
@@ -173,11 +167,10 @@ static int terminate_app(const char *app_id)
 	app_control_create(&request);
 	app_control_set_app_id(request, app_id);
 	int ret = app_control_send_terminate_request(request);
-	if (ret == APP_CONTROL_ERROR_NONE)
-		desktop_app_launch_drain(DELIVERY_TIMEOUT_SEC);
 	app_control_destroy(request);
 	if (ret != APP_CONTROL_ERROR_NONE) {
-		fprintf(stderr, "app_launcher: %s is not running\n", app_id);
+		fprintf(stderr, "app_launcher: %s: %s\n", app_id,
+		        ret == APP_CONTROL_ERROR_APP_NOT_FOUND ? "not running" : error_text(ret));
 		return EXIT_FAILED;
 	}
 	printf("asked %s to end\n", app_id);

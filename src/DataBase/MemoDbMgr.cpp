@@ -13,6 +13,7 @@
 #include <Ecore_File.h>
 #include <app_common.h>
 
+#include "MemoListRows.h"
 #include "MemoLog.h"
 #include "Util/MemoUtil.h"
 
@@ -76,6 +77,8 @@ MemoDbMgr *MemoDbMgr::getInstance()
 
 void MemoDbMgr::destroy()
 {
+	// Kept rows belong to this connection's view of the file.
+	MemoListRows::forget();
 	if (__handle) {
 		sqlite3_close_v2(__handle);
 		__handle = nullptr;

@@ -11,7 +11,11 @@
 #include "DataBase/MemoDocInfo.h"
 #include "List/MemoItemList.h"
 #include "MemoLog.h"
+#include "MemoListRows.h"
 #include "MemoSqlStmt.h"
+
+// Every list read selects 23 columns.
+#define MEMO_LIST_COLUMNS 23
 
 #define MEMO_SQL_ONE_MEMO                                                                                              \
 	"SELECT "                                                                                                          \
@@ -60,7 +64,19 @@
 // Fills a record from a row of one of the memo reads. The reads that select bgColor hold
 // isQuick and bgColor in columns 21 and 22 and keep titles as markup; the others hold
 // isHidden and isQuick there and keep titles as stored.
-static void __fillRecord(MemoSqlStmt &stmt, MemoDocInfo *info, bool withColor)
+// True when text is its own markup: printable ASCII with none of the characters that the markup
+// conversion turns into entities or tags (it also names most letters beyond ASCII).
+static bool __isOwnMarkup(const char *text)
+{
+	if (!text)
+		return false;
+	for (const unsigned char *p = reinterpret_cast<const unsigned char *>(text); *p; ++p)
+		if (*p < 0x20 || *p > 0x7e || *p == '<' || *p == '>' || *p == '&' || *p == '"' || *p == '\'')
+			return false;
+	return true;
+}
+
+template <typename Row> static void __fillRecord(Row &stmt, MemoDocInfo *info, bool withColor)
 {
 	info->setMemoUUID(stmt.text(0));
 	info->setIsDirty(stmt.integer(1));
@@ -74,9 +90,14 @@ static void __fillRecord(MemoSqlStmt &stmt, MemoDocInfo *info, bool withColor)
 	info->setLastModifiedAt(stmt.u64(9));
 	info->setCategoryUUID(stmt.text(10));
 	if (withColor) {
-		char *title = elm_entry_utf8_to_markup(stmt.text(11));
-		info->setTitle(title);
-		free(title);
+		const char *plain = stmt.text(11);
+		if (__isOwnMarkup(plain)) {
+			info->setTitle(plain);
+		} else {
+			char *title = elm_entry_utf8_to_markup(plain);
+			info->setTitle(title);
+			free(title);
+		}
 	} else {
 		info->setTitle(stmt.text(11));
 	}
@@ -137,12 +158,18 @@ MemoDocInfo *MemoDbMgr::getOneMemoN(const char *uuid)
 MemoItemList *MemoDbMgr::__getMemoListN(const char *sql, bool withColor)
 {
 	MemoItemList *list = new MemoItemList();
-	MemoSqlStmt stmt(__createSqliteStmt(sql));
-	if (!stmt)
-		return list;
-	while (stmt.step() == SQLITE_ROW) {
+	std::shared_ptr<const MemoListRows> rows = MemoListRows::find(__handle, sql);
+	if (!rows) {
+		MemoSqlStmt stmt(__createSqliteStmt(sql));
+		if (!stmt)
+			return list;
+		rows = std::make_shared<MemoListRows>(stmt, MEMO_LIST_COLUMNS);
+		MemoListRows::keep(__handle, sql, rows);
+	}
+	for (int row = 0; row < rows->count(); ++row) {
 		MemoDocInfo *info = new MemoDocInfo();
-		__fillRecord(stmt, info, withColor);
+		MemoListRowReader reader(*rows, row);
+		__fillRecord(reader, info, withColor);
 		list->appendItem(info);
 	}
 	return list;

@@ -17,6 +17,68 @@ MemoDocInfo::MemoDocInfo()
 
 MemoDocInfo::~MemoDocInfo() {}
 
+MemoDocInfo::MemoDocInfo(const MemoDocInfo &other)
+{
+	*this = other;
+}
+
+MemoDocInfo &MemoDocInfo::operator=(const MemoDocInfo &other)
+{
+	if (this == &other)
+		return *this;
+	__memoUUID = other.__memoUUID;
+	__isDirty = other.__isDirty;
+	__isDeleted = other.__isDeleted;
+	__accountType = other.__accountType;
+	__accountName = other.__accountName;
+	__sync1 = other.__sync1;
+	__sync2 = other.__sync2;
+	__isNeedUpsync = other.__isNeedUpsync;
+	__createdAt = other.__createdAt;
+	__lastModifiedAt = other.__lastModifiedAt;
+	__categoryUUID = other.__categoryUUID;
+	__title = other.__title;
+	__content = other.__content;
+	__androidXmlContent = other.__androidXmlContent;
+	__tizenXmlContent = other.__tizenXmlContent;
+	__displayContent = other.__displayContent;
+	__vrfileUUID = other.__vrfileUUID;
+	__strippedContent = other.__strippedContent;
+	__data = other.__data;
+	__phoneNum = other.__phoneNum;
+	__isFavorite = other.__isFavorite;
+	__isHidden = other.__isHidden;
+	__isQuick = other.__isQuick;
+	__fileCount = other.__fileCount;
+	__files.reset();
+	if (other.__files) {
+		MemoFileInfo *files = getFiles();
+		for (int i = 0; i < MEMO_MAX_FILE_COUNT; ++i)
+			files[i] = other.__files[i];
+	}
+	__bgRed = other.__bgRed;
+	__bgGreen = other.__bgGreen;
+	__bgBlue = other.__bgBlue;
+	__bgAlpha = other.__bgAlpha;
+	__bgColor = other.__bgColor;
+	__changed = other.__changed;
+	return *this;
+}
+
+MemoFileInfo *MemoDocInfo::getFiles()
+{
+	if (!__files)
+		__files.reset(new MemoFileInfo[MEMO_MAX_FILE_COUNT]);
+	return __files.get();
+}
+
+const MemoFileInfo *MemoDocInfo::getFiles() const
+{
+	if (!__files)
+		__files.reset(new MemoFileInfo[MEMO_MAX_FILE_COUNT]);
+	return __files.get();
+}
+
 bool MemoDocInfo::setMemoUUID(const char *uuid)
 {
 	if (!uuid) {
@@ -193,9 +255,10 @@ void MemoDocInfo::copyFileInfos(const MemoFileInfo *source)
 {
 	if (!source)
 		return;
+	MemoFileInfo *files = getFiles();
 	for (int i = 0; i < __fileCount && i < MEMO_MAX_FILE_COUNT; ++i) {
 		const MemoFileInfo &from = source[i];
-		MemoFileInfo &to = __files[i];
+		MemoFileInfo &to = files[i];
 		to.setFileUUID(from.getFileUUID());
 		to.setIsDirty(from.getIsDirty());
 		to.setIsDeleted(from.getIsDeleted());

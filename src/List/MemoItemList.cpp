@@ -3,7 +3,7 @@
 #include "DataBase/MemoDocInfo.h"
 #include "MemoLog.h"
 
-MemoItemList::MemoItemList() : __list(nullptr) {}
+MemoItemList::MemoItemList() {}
 
 MemoItemList::~MemoItemList()
 {
@@ -16,37 +16,37 @@ void MemoItemList::appendItem(MemoDocInfo *item)
 		MEMO_LOGE("input is NULL");
 		return;
 	}
-	__list = eina_list_append(__list, item);
+	__list.push_back(item);
 }
 
 MemoDocInfo *MemoItemList::getItem(int index)
 {
-	if (!__list) {
+	if (__list.empty()) {
 		MEMO_LOGE("__list is NULL");
 		return nullptr;
 	}
-	if (index < 0)
+	if (index < 0 || static_cast<size_t>(index) >= __list.size())
 		return nullptr;
-	return static_cast<MemoDocInfo *>(eina_list_nth(__list, static_cast<unsigned int>(index)));
+	return __list[static_cast<size_t>(index)];
 }
 
 int MemoItemList::getCount()
 {
-	if (!__list) {
+	if (__list.empty()) {
 		MEMO_LOGE("__list is NULL");
 		return 0;
 	}
-	return static_cast<int>(eina_list_count(__list));
+	return static_cast<int>(__list.size());
 }
 
 void MemoItemList::__clearList()
 {
-	if (!__list) {
+	if (__list.empty()) {
 		MEMO_LOGE("__list is NULL");
 		return;
 	}
-	void *data = nullptr;
-	EINA_LIST_FREE(__list, data)
-	delete static_cast<MemoDocInfo *>(data);
-	__list = nullptr;
+	for (MemoDocInfo *item : __list)
+		delete item;
+	__list.clear();
+	__list.shrink_to_fit();
 }

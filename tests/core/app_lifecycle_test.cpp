@@ -46,6 +46,16 @@ public:
 		gCalls.push_back("onCreate");
 		return MemoApp::onCreate();
 	}
+	void onResume() override
+	{
+		gCalls.push_back("onResume");
+		MemoApp::onResume();
+	}
+	void onTerminate() override
+	{
+		gCalls.push_back("onTerminate");
+		MemoApp::onTerminate();
+	}
 	void onAppControl(app_control_s *request, bool firstLaunch) override
 	{
 		gCalls.push_back(firstLaunch ? "onAppControl(first)" : "onAppControl");
@@ -53,59 +63,39 @@ public:
 		if (firstLaunch && !__timer)
 			__timer = ecore_timer_add(0.01, __stepCb, this);
 	}
-	void onResume() override
-	{
-		gCalls.push_back("onResume");
-		MemoApp::onResume();
-	}
-	void onPause() override
-	{
-		gCalls.push_back("onPause");
-		MemoApp::onPause();
-	}
-	void onTerminate() override
-	{
-		gCalls.push_back("onTerminate");
-		MemoApp::onTerminate();
-	}
 
 	bool finished = false;
 	// How the scenario ends the app; ui_app_exit() when empty.
 	std::function<void()> closer;
 
 private:
+	// One step a tick: its action once, then its condition until it holds or five seconds pass.
 	static Eina_Bool __stepCb(void *data)
 	{
 		ScriptedApp *self = static_cast<ScriptedApp *>(data);
 		if (self->__index < self->__steps.size()) {
 			Step &step = self->__steps[self->__index];
-			if (!self->__started) {
-				self->__started = true;
+			if (!self->__deadline && step.action)
+				step.action();
+			if (!self->__deadline)
 				self->__deadline = ecore_time_get() + 5.0;
-				if (step.action)
-					step.action();
-			}
 			bool done = !step.until || step.until();
 			if (!done && ecore_time_get() < self->__deadline)
 				return ECORE_CALLBACK_RENEW;
 			EXPECT_TRUE(done) << "step " << self->__index << " timed out";
 			self->__index = done ? self->__index + 1 : self->__steps.size();
-			self->__started = false;
+			self->__deadline = 0;
 			if (self->__index < self->__steps.size())
 				return ECORE_CALLBACK_RENEW;
 		}
 		self->finished = true;
 		self->__timer = nullptr;
-		if (self->closer)
-			self->closer();
-		else
-			ui_app_exit();
+		self->closer ? self->closer() : ui_app_exit();
 		return ECORE_CALLBACK_CANCEL;
 	}
 
 	std::vector<Step> __steps;
 	size_t __index = 0;
-	bool __started = false;
 	double __deadline = 0;
 	Ecore_Timer *__timer = nullptr;
 };
@@ -156,7 +146,9 @@ static bool colorClassIs(const char *name, int r, int g, int b)
 	return cr == r && cg == g && cb == b;
 }
 
-TEST_F(AppLifecycleTest, startRunsTheLifecycleInOrderAndShowsOneFirstPage)
+// One run as a user has it: the first page, then device changes while the loop runs (rotation, language,
+// time format, theme), each told on the bus once, then the window's close request.
+TEST_F(AppLifecycleTest, startShowsOneFirstPageCarriesDeviceChangesToTheBusAndEndsInOrder)
 {
 	auto checkFirstScreen = [this] {
 		Evas_Object *win = window();
@@ -166,10 +158,10 @@ TEST_F(AppLifecycleTest, startRunsTheLifecycleInOrderAndShowsOneFirstPage)
 		EXPECT_STREQ(current->getWindowController()->getName(), "com.veltron.memo");
 		app_assist::WNaviframeController *naviframe = app_test::naviframeOf(current);
 		ASSERT_NE(naviframe, nullptr);
-		// The first request pushed the one first page (a new memo until the list stands in its place).
+		// The first request pushed the one first page, the memo list.
 		EXPECT_EQ(naviframe->getContentViewCount(), 1);
 		ASSERT_NE(naviframe->getTopContentViewController(), nullptr);
-		EXPECT_STREQ(naviframe->getTopContentViewController()->getClassName(), "MemoEditView");
+		EXPECT_STREQ(naviframe->getTopContentViewController()->getClassName(), "MemoListView");
 
 		// The app's theme: its base layout holding the naviframe, its tables applied.
 		Evas_Object *baseLayout = current->getWindowController()->getBaseLayoutEvasObj();
@@ -181,32 +173,19 @@ TEST_F(AppLifecycleTest, startRunsTheLifecycleInOrderAndShowsOneFirstPage)
 
 		EXPECT_TRUE(ecore_file_exists((std::string(getenv("TIZEN_APP_ROOT")) + "/data/memo.db").c_str()));
 	};
-	// Ended as a user ends it: the window's close request.
-	auto closeWindow = [this] { evas_object_smart_callback_call(window(), "delete,request", nullptr); };
-	int rc = run({{[this] { bus.attach(); }, nullptr}, {checkFirstScreen, nullptr}}, closeWindow);
-
-	EXPECT_EQ(rc, APP_ERROR_NONE);
-	ASSERT_GE(gCalls.size(), 5u);
-	EXPECT_EQ(gCalls[0], "onCreate");
-	EXPECT_EQ(gCalls[1], "onAppControl(first)");
-	EXPECT_EQ(gCalls[2], "onResume");
-	EXPECT_EQ(gCalls[gCalls.size() - 3], "onPause");
-	EXPECT_EQ(gCalls[gCalls.size() - 2], "onTerminate");
-	EXPECT_EQ(gCalls.back(), "destructor");
-	// The bus went with onTerminate, and the listener with it.
-	EXPECT_EQ(bus.keys, std::vector<std::string>{"broadcast,memo,app,pause"});
-	EXPECT_EQ(MemoBroadCaster::getInstance().getListenerCount(), 0u);
-	MemoBroadCaster::destroy();
-}
-
-TEST_F(AppLifecycleTest, rotationSetsThePortraitFlagAndAlwaysBroadcasts)
-{
-	const char *key = "broadcast,orientation,changed";
-	auto rotateTo = [this, key](int degree, unsigned char portrait, size_t count) {
-		return Step{[degree] { vconf_set_int("memory/desktop/rotation", degree); },
-		            [this, key, portrait, count] { return bus.countOf(key) == count && gIsPortrait == portrait; }};
+	const char *rotated = "broadcast,orientation,changed";
+	auto rotateTo = [this, rotated](int degree, unsigned char portrait, size_t count) {
+		return Step{
+		    [degree] { vconf_set_int("memory/desktop/rotation", degree); },
+		    [this, rotated, portrait, count] { return bus.countOf(rotated) == count && gIsPortrait == portrait; }};
 	};
-	run({{[this] { bus.attach(); }, nullptr},
+	auto told = [this](const char *key, size_t count) {
+		return [this, key, count] { return bus.countOf(key) == count; };
+	};
+	auto closeWindow = [this] { evas_object_smart_callback_call(window(), "delete,request", nullptr); };
+	int rc = run(
+	    {{[this] { bus.attach(); }, nullptr},
+	     {checkFirstScreen, nullptr},
 	     rotateTo(90, 0, 1),
 	     rotateTo(180, 1, 2),
 	     rotateTo(270, 0, 3),
@@ -217,41 +196,29 @@ TEST_F(AppLifecycleTest, rotationSetsThePortraitFlagAndAlwaysBroadcasts)
 		      elm_win_rotation_set(window(), 45);
 		      evas_object_smart_callback_call(window(), "wm,rotation,changed", nullptr);
 	      },
-	      [this, key] { return bus.countOf(key) == 5; }},
-	     {[] { EXPECT_EQ(gIsPortrait, 0); }, nullptr}});
-	gIsPortrait = 1;
-}
-
-TEST_F(AppLifecycleTest, languageAndTimeFormatChangesBroadcast)
-{
-	run({{[this] { bus.attach(); }, nullptr},
-	     {[] { vconf_set_str("db/menu_widget/language", "de_DE.UTF-8"); },
-	      [this] { return bus.countOf("broadcast,language,changed") == 1; }},
+	      told(rotated, 5)},
+	     {[] {
+		      EXPECT_EQ(gIsPortrait, 0);
+		      gIsPortrait = 1;
+		      vconf_set_str("db/menu_widget/language", "de_DE.UTF-8");
+	      },
+	      told("broadcast,language,changed", 1)},
 	     // The views' own text domains follow the language.
 	     {[] {
 		      EXPECT_STREQ(dgettext("memo-sub", "IDS_MEMO_BUTTON_DELETE"), "Löschen");
 		      EXPECT_STREQ(dgettext("memo", "IDS_MEMO_OPT_SEARCH"), "Suchen");
 		      vconf_set_str("db/menu_widget/language", "en_US.UTF-8");
 	      },
-	      [this] { return bus.countOf("broadcast,language,changed") == 2; }},
+	      told("broadcast,language,changed", 2)},
 	     {[] {
 		      EXPECT_STREQ(i18n_get_text("IDS_MEMO_BUTTON_DELETE"), "Delete");
 		      vconf_set_int("db/menu_widget/regionformat_time1224", 2);
 	      },
-	      [this] { return bus.countOf("broadcast,timeformat,changed") == 1; }},
-	     {[] { vconf_set_str("db/setting/timezone_id", "Europe/Berlin"); },
-	      [this] { return bus.countOf("broadcast,timeformat,changed") == 2; }}});
-	// Then only the pause of the way out.
-	EXPECT_EQ(bus.keys, (std::vector<std::string>{"broadcast,language,changed", "broadcast,language,changed",
-	                                              "broadcast,timeformat,changed", "broadcast,timeformat,changed",
-	                                              "broadcast,memo,app,pause"}));
-}
-
-TEST_F(AppLifecycleTest, themeChangeSetsBothTablesAgain)
-{
-	run({{[] {
+	      told("broadcast,timeformat,changed", 1)},
+	     {[] { vconf_set_str("db/setting/timezone_id", "Europe/Berlin"); }, told("broadcast,timeformat,changed", 2)},
+	     // A theme change sets both tables again, a text class changed behind the app's back included.
+	     {[] {
 		      EXPECT_TRUE(colorClassIs("AO010", 250, 248, 242));
-		      // A text class changed behind the app's back comes back with the tables.
 		      edje_text_class_set("ATO001", "Sans", 99);
 		      vconf_set_int("db/setting/change_ui/theme", 1);
 	      },
@@ -263,7 +230,19 @@ TEST_F(AppLifecycleTest, themeChangeSetsBothTablesAgain)
 		      EXPECT_EQ(size, 26);
 		      vconf_set_int("db/setting/change_ui/theme", 0);
 	      },
-	      [] { return colorClassIs("AO010", 250, 248, 242); }}});
+	      [] { return colorClassIs("AO010", 250, 248, 242); }}},
+	    closeWindow);
+	EXPECT_EQ(rc, APP_ERROR_NONE);
+	EXPECT_EQ(gCalls,
+	          (std::vector<std::string>{"onCreate", "onAppControl(first)", "onResume", "onTerminate", "destructor"}));
+	// Nothing else was said but the pause of the way out, before onTerminate took the bus and its listener.
+	std::vector<std::string> expected(5, rotated);
+	expected.insert(expected.end(),
+	                {"broadcast,language,changed", "broadcast,language,changed", "broadcast,timeformat,changed",
+	                 "broadcast,timeformat,changed", "broadcast,memo,app,pause"});
+	EXPECT_EQ(bus.keys, expected);
+	EXPECT_EQ(MemoBroadCaster::getInstance().getListenerCount(), 0u);
+	MemoBroadCaster::destroy();
 }
 
 } // namespace

@@ -90,19 +90,6 @@ TEST_F(AppPreferenceTest, firstRunWritesTheFiveDefaultsSilentlyThenSyncStatesAre
 	                                              "broadcast,sync,idle", "broadcast,sync,idle"}));
 }
 
-TEST_F(AppPreferenceTest, laterStartKeepsTheSyncStateAndWritesNoDefaults)
-{
-	preference_set_int("MEMO_SVC_PROCESSING", 1);
-	startApp();
-	EXPECT_EQ(prefInt("MEMO_SVC_PROCESSING"), 1);
-	bool exists = true;
-	preference_is_existing("QUICK_MEMO_STATE", &exists);
-	EXPECT_FALSE(exists);
-
-	otherProcessSets("MEMO_SVC_PROCESSING", 0, 1);
-	EXPECT_EQ(bus.keys, std::vector<std::string>{"broadcast,sync,idle"});
-}
-
 TEST_F(AppPreferenceTest, cloudTriggeringReachesTheListOrTheBus)
 {
 	startApp();
@@ -152,16 +139,24 @@ TEST_F(AppPreferenceTest, pauseAndResumeBroadcastAndRefreshTheTopPage)
 	EXPECT_EQ(bus.countOf("broadcast,memo,app,resume"), 4u);
 }
 
-TEST_F(AppPreferenceTest, secondAppInTheSameProcessStartsClean)
+// A later start, here a second app in the same process, keeps the sync state, writes no defaults and has
+// the callbacks, not the app that went.
+TEST_F(AppPreferenceTest, laterStartKeepsTheStateAndASecondAppInTheSameProcessStartsClean)
 {
 	startApp();
 	endApp();
 	EXPECT_EQ(MemoBroadCaster::getInstance().getListenerCount(), 0u);
 
+	preference_remove_all();
+	preference_set_int("MEMO_SVC_PROCESSING", 1);
+	preference_set_int("CLOUD_TRIGGERING", 1);
 	bus = BusRecorder();
 	startApp();
+	EXPECT_EQ(prefInt("MEMO_SVC_PROCESSING"), 1);
+	bool exists = true;
+	preference_is_existing("QUICK_MEMO_STATE", &exists);
+	EXPECT_FALSE(exists);
 
-	// The new app has the callbacks, not the one that went.
 	int listBecameTop = 0;
 	app_test::pushStub(app, "MemoListView", &listBecameTop);
 	ASSERT_TRUE(writeFromOtherProcess("pref-int", "CLOUD_TRIGGERING", "0"));

@@ -52,7 +52,6 @@ TEST_F(BusTest, onlyTheLastPopupCountsWhileItStandsAndUntilDestroy)
 	WPopupController *second = openPopup("second");
 	monitor->addPopup(first);
 	monitor->addPopup(second);
-	monitor->addPopup(nullptr); // changes nothing
 	ASSERT_TRUE(monitor->isPopupAlive());
 	EXPECT_EQ(monitor->getPopup(), second);
 

@@ -18,25 +18,21 @@
 #include "DataBase/MemoDocInfo.h"
 #include "List/MemoItemList.h"
 #include "TestEnv.h"
+#include "Util/MemoUtil.h"
 
 namespace store_test
 {
-// Takes over a malloc'ed path.
-inline std::string takeN(char *path)
-{
-	std::string result = path ? path : "";
-	free(path);
-	return result;
-}
-
 inline std::string dataPath()
 {
-	return takeN(app_get_data_path());
+	return MemoUtil::getDataPath();
 }
 
 inline std::string sharedDataPath()
 {
-	return takeN(app_get_shared_data_path());
+	char *path = app_get_shared_data_path();
+	std::string result = path;
+	free(path);
+	return result;
 }
 
 inline std::string dbPath()

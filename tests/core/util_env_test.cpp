@@ -6,10 +6,8 @@
 #include <functional>
 #include <string>
 
-#include <app_common.h>
 #include <vconf.h>
 
-#include "TestEnv.h"
 #include "Util/MemoUtil.h"
 
 // Each query reads its device key at the time of asking; unset keys give the normal device.
@@ -59,13 +57,8 @@ TEST(MemoUtilEnv, QueriesFollowTheDeviceKeys)
 
 TEST(MemoUtilEnv, DateTextFollowsTheClockSetting)
 {
-	// 2020-01-02 15:04:00 in local time.
 	struct tm when = {};
-	when.tm_year = 120;
-	when.tm_mon = 0;
-	when.tm_mday = 2;
-	when.tm_hour = 15;
-	when.tm_min = 4;
+	strptime("2020-01-02 15:04", "%Y-%m-%d %H:%M", &when);
 	when.tm_isdst = -1;
 	time_t seconds = mktime(&when);
 	vconf_set_str(VCONFKEY_REGIONFORMAT, "en_US");

@@ -13,7 +13,7 @@ namespace
 const std::string OP = "-o http://tizen.org/appcontrol/operation/", SHARE = OP + "share ";
 const std::string SHARE_TEXT = OP + "share_text", TEXT = " -d http://tizen.org/appcontrol/data/text ";
 const std::string QUICK = OP + "send_text_quickmemo -r" + TEXT;
-const std::string LIST = memo_test::LIST_PAGE, EDIT = "MemoEditView";
+const std::string LIST = "MemoListView", EDIT = "MemoEditView";
 const char *const COUNT = "SELECT count(*) FROM memo";
 
 TEST(LaunchRoutingTest, EachRequestShowsAndFillsItsPage)

@@ -1,5 +1,6 @@
 // The application lifecycle in this process: callback order, the command-line request, events driven
-// by vconf (language, rotation), pause/resume de-duplication and the screenshot hook.
+// by vconf (language, rotation) and pause/resume de-duplication. The screenshot hook is run end to end
+// by the e2e test.
 #include <gtest/gtest.h>
 
 #include <Elementary.h>
@@ -23,8 +24,7 @@ struct AppRun {
 	void (*onRequest)(AppRun *run, app_control_h request) = nullptr;
 	std::string lang;
 	int orientation = -1;
-	int wmRotationCalls = 0;
-	int winRotation = -1;
+	std::vector<int> winRotations;
 	int removedHandlerCalls = 0;
 	app_event_handler_h langHandler = nullptr;
 	app_event_handler_h removedHandler = nullptr;
@@ -63,16 +63,6 @@ void terminateCb(void *data)
 	run->win = nullptr;
 }
 
-void pauseCb(void *data)
-{
-	static_cast<AppRun *>(data)->calls.push_back("pause");
-}
-
-void resumeCb(void *data)
-{
-	static_cast<AppRun *>(data)->calls.push_back("resume");
-}
-
 void requestCb(app_control_h request, void *data)
 {
 	AppRun *run = static_cast<AppRun *>(data);
@@ -87,7 +77,9 @@ void requestCb(app_control_h request, void *data)
 int runApp(AppRun &run, std::vector<const char *> args = {})
 {
 	args.insert(args.begin(), "lifecycle_test");
-	ui_app_lifecycle_callback_s cb = {createCb, terminateCb, pauseCb, resumeCb, requestCb};
+	ui_app_lifecycle_callback_s cb = {
+	    createCb, terminateCb, [](void *data) { static_cast<AppRun *>(data)->calls.push_back("pause"); },
+	    [](void *data) { static_cast<AppRun *>(data)->calls.push_back("resume"); }, requestCb};
 	return ui_app_main((int)args.size(), const_cast<char **>(args.data()), &cb, &run);
 }
 
@@ -100,11 +92,10 @@ protected:
 };
 } // namespace
 
-TEST_F(AppLifecycle, RunsCreateRequestResumeThenPauseTerminateWithTheArgvRequest)
+TEST_F(AppLifecycle, CallbacksComeInOrderWithTheArgvRequestAndFollowTheWindow)
 {
 	AppRun run;
 	static std::string extras;
-	extras.clear();
 	run.onRequest = [](AppRun *, app_control_h request) {
 		char *v = nullptr;
 		char **arr = nullptr;
@@ -123,22 +114,31 @@ TEST_F(AppLifecycle, RunsCreateRequestResumeThenPauseTerminateWithTheArgvRequest
 	EXPECT_EQ((std::vector<std::string>{"create", "request test/op", "resume", "pause", "terminate"}), run.calls);
 	EXPECT_EQ("v=w|2ab", extras);
 
-	AppRun plain;
-	plain.onRequest = [](AppRun *, app_control_h) { ui_app_exit(); };
-	EXPECT_EQ(APP_ERROR_NONE, runApp(plain));
-	ASSERT_GE(plain.calls.size(), 2u);
-	EXPECT_EQ("request " APP_CONTROL_OPERATION_MAIN, plain.calls[1]);
-}
+	// Window changes count once the app runs, that is after its first request, and each state once.
+	AppRun windowed;
+	windowed.onRequest = [](AppRun *r, app_control_h) {
+		ecore_timer_add(
+		    0.0,
+		    [](void *data) -> Eina_Bool {
+			    Evas_Object *win = static_cast<AppRun *>(data)->win;
+			    for (const char *event : {"iconified", "iconified", "normal", "focused"})
+				    evas_object_smart_callback_call(win, event, nullptr);
+			    ui_app_exit();
+			    return ECORE_CALLBACK_CANCEL;
+		    },
+		    r);
+	};
+	EXPECT_EQ(APP_ERROR_NONE, runApp(windowed));
+	EXPECT_EQ((std::vector<std::string>{"create", "request " APP_CONTROL_OPERATION_MAIN, "resume", "pause", "resume",
+	                                    "pause", "terminate"}),
+	          windowed.calls);
 
-TEST_F(AppLifecycle, RefusedCreateEndsAtOnceWithoutRequestOrTerminate)
-{
-	AppRun run;
-	run.createResult = false;
-	EXPECT_EQ(APP_ERROR_INVALID_CONTEXT, runApp(run));
-	EXPECT_EQ(std::vector<std::string>{"create"}, run.calls);
-	if (run.guard)
-		ecore_timer_del(run.guard);
-	evas_object_del(run.win);
+	AppRun refused;
+	refused.createResult = false;
+	EXPECT_EQ(APP_ERROR_INVALID_CONTEXT, runApp(refused));
+	EXPECT_EQ(std::vector<std::string>{"create"}, refused.calls);
+	ecore_timer_del(refused.guard);
+	evas_object_del(refused.win);
 }
 
 // Two text domains of the app, each with a German and a French catalogue.
@@ -200,78 +200,24 @@ TEST_F(AppLifecycle, RotationKeyRotatesTheWindowsAndAnnouncesIt)
 	AppRun run;
 	run.onRequest = [](AppRun *r, app_control_h) {
 		auto wmCb = [](void *data, Evas_Object *win, void *) {
-			AppRun *self = static_cast<AppRun *>(data);
-			self->wmRotationCalls++;
-			self->winRotation = elm_win_rotation_get(win);
+			static_cast<AppRun *>(data)->winRotations.push_back(elm_win_rotation_get(win));
 		};
 		evas_object_smart_callback_add(r->win, "wm,rotation,changed", wmCb, r);
+		// The windows turn first; the event then ends the run.
 		auto orientationCb = [](app_event_info_h info, void *data) {
-			AppRun *self = static_cast<AppRun *>(data);
 			app_device_orientation_e o = APP_DEVICE_ORIENTATION_0;
 			EXPECT_EQ(APP_ERROR_NONE, app_event_get_device_orientation(info, &o));
-			self->orientation = o;
+			static_cast<AppRun *>(data)->orientation = o;
+			ui_app_exit();
 		};
 		ui_app_add_event_handler(&r->orientationHandler, APP_EVENT_DEVICE_ORIENTATION_CHANGED, orientationCb, r);
 		vconf_set_int("memory/desktop/rotation", 45); // not a rotation: ignored
 		vconf_set_int("memory/desktop/rotation", 90);
 	};
-	// Ends once the rotation has been seen (or by the guard).
-	ui_app_lifecycle_callback_s cb = {createCb, terminateCb, pauseCb, resumeCb, requestCb};
-	Ecore_Timer *poll = ecore_timer_add(
-	    0.02,
-	    [](void *data) -> Eina_Bool {
-		    AppRun *r = static_cast<AppRun *>(data);
-		    if (r->orientation < 0 || !r->win)
-			    return ECORE_CALLBACK_RENEW;
-		    ui_app_exit();
-		    return ECORE_CALLBACK_CANCEL;
-	    },
-	    &run);
-	const char *args[] = {"lifecycle_test"};
-	EXPECT_EQ(APP_ERROR_NONE, ui_app_main(1, const_cast<char **>(args), &cb, &run));
-	if (run.orientation < 0)
-		ecore_timer_del(poll);
+	EXPECT_EQ(APP_ERROR_NONE, runApp(run));
 	EXPECT_EQ(90, run.orientation);
-	EXPECT_EQ(1, run.wmRotationCalls);
-	EXPECT_EQ(90, run.winRotation);
+	EXPECT_EQ(std::vector<int>{90}, run.winRotations);
 	EXPECT_EQ(APP_DEVICE_ORIENTATION_90, app_get_device_orientation());
 	ui_app_remove_event_handler(run.orientationHandler);
 	vconf_set_int("memory/desktop/rotation", 0);
-}
-
-TEST_F(AppLifecycle, WindowStateChangesPauseAndResumeOnce)
-{
-	AppRun run;
-	run.onRequest = [](AppRun *r, app_control_h) {
-		// Window changes count once the app runs, that is after its first request.
-		ecore_timer_add(
-		    0.0,
-		    [](void *data) -> Eina_Bool {
-			    Evas_Object *win = static_cast<AppRun *>(data)->win;
-			    evas_object_smart_callback_call(win, "iconified", nullptr);
-			    evas_object_smart_callback_call(win, "iconified", nullptr);
-			    evas_object_smart_callback_call(win, "normal", nullptr);
-			    evas_object_smart_callback_call(win, "focused", nullptr);
-			    ui_app_exit();
-			    return ECORE_CALLBACK_CANCEL;
-		    },
-		    r);
-	};
-	EXPECT_EQ(APP_ERROR_NONE, runApp(run));
-	EXPECT_EQ((std::vector<std::string>{"create", "request " APP_CONTROL_OPERATION_MAIN, "resume", "pause", "resume",
-	                                    "pause", "terminate"}),
-	          run.calls);
-}
-
-TEST_F(AppLifecycle, ScreenshotHookSavesTheFirstScreenAndEnds)
-{
-	const std::string png = memo_test::makeTempDir("shot") + "/first.png";
-	setenv("TIZEN_SCREENSHOT", png.c_str(), 1);
-	setenv("TIZEN_SCREENSHOT_EXIT", "1", 1);
-	AppRun run;
-	EXPECT_EQ(APP_ERROR_NONE, runApp(run));
-	unsetenv("TIZEN_SCREENSHOT");
-	unsetenv("TIZEN_SCREENSHOT_EXIT");
-	EXPECT_EQ("terminate", run.calls.back());
-	EXPECT_EQ(0u, memo_test::readFile(png).find("\x89PNG"));
 }

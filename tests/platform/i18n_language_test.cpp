@@ -44,9 +44,8 @@ protected:
 		compileCatalogue(res, "fr", "Bonjour");
 		// Before the first lookup: the domain is bound lazily.
 		setenv("TIZEN_APP_RES_DIR", res.c_str(), 1);
+		ecore_init(); // for the change notices
 	}
-	void SetUp() override { ecore_init(); }
-	void TearDown() override { ecore_shutdown(); }
 
 	static void changeLanguage(const char *langset)
 	{

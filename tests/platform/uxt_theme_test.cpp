@@ -90,36 +90,21 @@ TEST_F(UxtTheme, ColorTableSetsColourClassesThatObjectsReportBack)
 	EXPECT_EQ(10, r);
 	EXPECT_EQ(250, globalColor("UXT_TEST_B011").r);
 	evas_object_del(win);
+
+	// Missing table files, and tables of the other kind, are refused.
+	EXPECT_EQ(nullptr, uxt_theme_add_color_table("/nonexistent/table.xml"));
+	EXPECT_EQ(nullptr, uxt_theme_add_color_table(kFontTable.c_str()));
+	EXPECT_EQ(nullptr, uxt_theme_add_font_table(kColorTable.c_str()));
 }
 
-TEST_F(UxtTheme, ThemeKeyChangeReappliesTheTableAndFiresColourCallbacks)
+TEST_F(UxtTheme, KeyChangesReapplyTheTablesAndFireTheirCallbacksUntilRemoved)
 {
 	ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_set_changeable_ui_enabled(EINA_TRUE));
 	ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_set_color_table(colors));
-	ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_add_changed_callback(UXT_THEME_CHANGED_TYPE_COLOR, changedCb, &changes));
-	EXPECT_EQ(250, globalColor("UXT_TEST_B011").r);
-
-	vconf_set_int(VCONFKEY_SETAPPL_CHANGE_UI_THEME_INT, 1);
-	ASSERT_TRUE(memo_test::pump(5.0, [this] { return !changes.empty(); }));
-	EXPECT_EQ(UXT_THEME_CHANGED_TYPE_COLOR, changes[0]);
-	Rgba dark = globalColor("UXT_TEST_B011");
-	EXPECT_EQ(20, dark.r);
-	EXPECT_EQ(255, dark.a);
-
-	// Once removed, a callback hears nothing more.
-	ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_delete_changed_callback(UXT_THEME_CHANGED_TYPE_COLOR, changedCb));
-	EXPECT_EQ(UXT_ERROR_NO_DATA, uxt_theme_delete_changed_callback(UXT_THEME_CHANGED_TYPE_COLOR, changedCb));
-	size_t before = changes.size();
-	vconf_set_int(VCONFKEY_SETAPPL_CHANGE_UI_THEME_INT, 0);
-	ASSERT_TRUE(memo_test::pump(5.0, [] { return globalColor("UXT_TEST_B011").r == 250; }));
-	EXPECT_EQ(before, changes.size());
-}
-
-TEST_F(UxtTheme, FontTableFollowsTheFontSizeKeyUnlessFixed)
-{
-	ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_set_changeable_ui_enabled(EINA_TRUE));
 	ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_set_font_table(fonts));
-	ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_add_changed_callback(UXT_THEME_CHANGED_TYPE_FONT, changedCb, &changes));
+	for (auto type : {UXT_THEME_CHANGED_TYPE_COLOR, UXT_THEME_CHANGED_TYPE_FONT})
+		ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_add_changed_callback(type, changedCb, &changes));
+	EXPECT_EQ(250, globalColor("UXT_TEST_B011").r);
 	const char *font = nullptr;
 	Evas_Font_Size size = 0;
 	ASSERT_TRUE(edje_text_class_get("UXT_TEST_T011", &font, &size));
@@ -127,20 +112,26 @@ TEST_F(UxtTheme, FontTableFollowsTheFontSizeKeyUnlessFixed)
 	EXPECT_EQ(40, size);
 	EXPECT_FALSE(edje_text_class_get("UXT_TEST_NOSIZE", &font, &size));
 
+	vconf_set_int(VCONFKEY_SETAPPL_CHANGE_UI_THEME_INT, 1);
+	ASSERT_TRUE(memo_test::pump(5.0, [this] { return changes.size() == 1; }));
+	EXPECT_EQ(UXT_THEME_CHANGED_TYPE_COLOR, changes[0]);
+	Rgba dark = globalColor("UXT_TEST_B011");
+	EXPECT_EQ(20, dark.r);
+	EXPECT_EQ(255, dark.a);
 	vconf_set_int(VCONFKEY_SETAPPL_ACCESSIBILITY_FONT_SIZE, 3);
-	ASSERT_TRUE(memo_test::pump(5.0, [this] { return !changes.empty(); }));
-	EXPECT_EQ(UXT_THEME_CHANGED_TYPE_FONT, changes[0]);
+	ASSERT_TRUE(memo_test::pump(5.0, [this] { return changes.size() == 2; }));
+	EXPECT_EQ(UXT_THEME_CHANGED_TYPE_FONT, changes[1]);
 	ASSERT_TRUE(edje_text_class_get("UXT_TEST_T011", &font, &size));
 	EXPECT_EQ(60, size);
 	ASSERT_TRUE(edje_text_class_get("UXT_TEST_T012", &font, &size));
 	EXPECT_STREQ("Serif:style=Regular", font);
 	EXPECT_EQ(30, size);
-}
 
-TEST_F(UxtTheme, MissingOrWrongTableFilesAreRejected)
-{
-	EXPECT_EQ(nullptr, uxt_theme_add_color_table("/nonexistent/table.xml"));
-	EXPECT_EQ(nullptr, uxt_theme_add_color_table(kFontTable.c_str()));
-	EXPECT_EQ(nullptr, uxt_theme_add_font_table(kColorTable.c_str()));
+	// Once removed, a callback hears nothing more.
+	ASSERT_EQ(UXT_ERROR_NONE, uxt_theme_delete_changed_callback(UXT_THEME_CHANGED_TYPE_COLOR, changedCb));
+	EXPECT_EQ(UXT_ERROR_NO_DATA, uxt_theme_delete_changed_callback(UXT_THEME_CHANGED_TYPE_COLOR, changedCb));
+	vconf_set_int(VCONFKEY_SETAPPL_CHANGE_UI_THEME_INT, 0);
+	ASSERT_TRUE(memo_test::pump(5.0, [] { return globalColor("UXT_TEST_B011").r == 250; }));
+	EXPECT_EQ(2u, changes.size());
 }
 } // namespace

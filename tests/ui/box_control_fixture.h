@@ -18,30 +18,35 @@
 namespace memo_ui_test
 {
 
+// One todolist line as the store keeps it, for an item holding `markup`.
+inline std::string todoItem(int type, bool state, const std::string &markup)
+{
+	std::string content;
+	for (char c : markup)
+		content += c == '<' ? "&lt;" : c == '>' ? "&gt;" : c == '&' ? "&amp;" : c == '"' ? "&quot;" : std::string(1, c);
+	return std::string("<todolist_item todo_item_type=\"") + std::to_string(type) + "\" todo_item_state=\"" +
+	       (state ? "true" : "false") + "\" todo_item_content=\"" + content + "\"/>\n";
+}
+
+inline std::string todoList(const std::string &lines)
+{
+	return "<todolist>\n" + lines + "</todolist>\n";
+}
+
+// A picture tag as the editor writes it.
+inline std::string tag(int w, int h, const std::string &path)
+{
+	return "<item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path + "></item>";
+}
+
 class BoxControlFixture : public UiFixture
 {
 protected:
-	void SetUp() override
-	{
-		// As the app sets it: layout sizes are given for a scale of 2.6.
-		elm_app_base_scale_set(2.6);
-		UiFixture::SetUp();
-	}
-
-	void TearDown() override
-	{
-		// The control goes with the window.
-		UiFixture::TearDown();
-		control = nullptr;
-		elm_config_scale_set(1.0);
-	}
-
-	// Builds a control for `doc` (may be null) in `mode`; it replaces the fixture's own box.
+	// Builds a control for `doc` (may be null) in `mode`, as the scroller's content.
 	MemoBoxControl *makeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
 	{
 		control = new MemoBoxControl(doc, mode, uuid);
 		EXPECT_TRUE(control->create(scroller, nullptr));
-		box = nullptr;
 		control->getSignal().addListener([this](const char *key, void *payload) {
 			keys.push_back(key);
 			payloads.push_back(payload && strcmp(key, "action,image,selected") == 0 ? static_cast<char *>(payload)
@@ -53,16 +58,21 @@ protected:
 	}
 
 	// A control in `mode` on `record`, whose body becomes `lines` (todolist items); a second call
-	// within one test starts on a fresh window.
-	MemoBoxControl *withBody(const std::string &lines, int mode = MODE_UPDATE);
+	// within one test replaces the control.
+	MemoBoxControl *withBody(const std::string &lines, int mode = MODE_UPDATE)
+	{
+		record.setMemoUUID("box-test-memo");
+		record.setTizenXmlContent(todoList(lines).c_str());
+		return control ? remakeControl(&record, mode) : makeControl(&record, mode);
+	}
 
-	// A fresh window and control, for a second set-up within one test.
+	// A fresh control in the same window, for a second set-up within one test.
 	MemoBoxControl *remakeControl(MemoDocInfo *doc, int mode, const char *uuid = "box-test-memo")
 	{
-		UiFixture::TearDown();
-		UiFixture::SetUp();
+		control->destroy();
 		keys.clear();
 		payloads.clear();
+		desktop_toast_log_clear();
 		return makeControl(doc, mode, uuid);
 	}
 
@@ -111,6 +121,34 @@ protected:
 
 	std::string lastKey() const { return keys.empty() ? "" : keys.back(); }
 
+	std::string titleText() const
+	{
+		char *t = control->getTitleTextN();
+		std::string result = t ? t : "<null>";
+		free(t);
+		return result;
+	}
+
+	// The kinds and texts of the body items, e.g. "5:l1 1:l2 0:l3".
+	std::string shape() const
+	{
+		std::string out;
+		for (MemoBoxItem *item : items())
+			out += (out.empty() ? "" : " ") + std::to_string(item->getType()) + ":" + text(item);
+		return out;
+	}
+
+	// Focuses the item's entry and puts the cursor at `pos` (-1: the end).
+	void focusAt(MemoBoxItem *item, int pos = -1)
+	{
+		focus(item->getEntry());
+		if (pos < 0)
+			elm_entry_cursor_end_set(item->getEntry());
+		else
+			elm_entry_cursor_pos_set(item->getEntry(), pos);
+		runFor(0.03);
+	}
+
 	// The memo's media folder, made.
 	static std::string mediaDir(const char *uuid = "box-test-memo")
 	{
@@ -119,37 +157,19 @@ protected:
 		return dir;
 	}
 
+	// A picture of w x h in the memo's media folder.
+	static std::string picture(const char *name, int w = 1000, int h = 500)
+	{
+		const std::string path = mediaDir() + name;
+		EXPECT_TRUE(writePicture(path, w, h));
+		return path;
+	}
+
 	MemoBoxControl *control = nullptr;
 	MemoDocInfo record;
 	std::vector<std::string> keys;
 	std::vector<std::string> payloads;
 };
-
-// One todolist line as the store keeps it.
-inline std::string todoItem(int type, bool state, const std::string &escapedContent)
-{
-	return std::string("<todolist_item todo_item_type=\"") + std::to_string(type) + "\" todo_item_state=\"" +
-	       (state ? "true" : "false") + "\" todo_item_content=\"" + escapedContent + "\"/>\n";
-}
-
-inline std::string todoList(const std::string &lines)
-{
-	return "<todolist>\n" + lines + "</todolist>\n";
-}
-
-// A picture tag with its break, escaped as todolist content.
-inline std::string escapedTag(int w, int h, const std::string &path)
-{
-	return "&lt;item size=" + std::to_string(w) + "x" + std::to_string(h) + " vsize=full href=file://" + path +
-	       "&gt;&lt;/item&gt;&lt;br/&gt;";
-}
-
-inline MemoBoxControl *BoxControlFixture::withBody(const std::string &lines, int mode)
-{
-	record.setMemoUUID("box-test-memo");
-	record.setTizenXmlContent(todoList(lines).c_str());
-	return control ? remakeControl(&record, mode) : makeControl(&record, mode);
-}
 
 } // namespace memo_ui_test
 

@@ -1,9 +1,11 @@
-// The box control answering its items: adding and removing items, focus and the shared budget, the
-// Done state, the star, taps and the keypad hold. Real key and pointer events throughout.
+// The box control answering its items: the shared budget, the Done state, the keypad hold, guide texts,
+// taps and the star. Real key and pointer events throughout.
 #include <gtest/gtest.h>
 
 #include <memory>
 #include <string>
+
+#include <app_i18n.h>
 
 #include "DataBase/MemoDbMgr.h"
 #include "TestEnv.h"
@@ -11,136 +13,22 @@
 
 using namespace memo_ui_test;
 
-namespace
-{
-class BoxControlItemsTest : public BoxControlFixture
-{
-protected:
-	// Focuses the item's entry and puts the cursor at `pos` (-1: the end).
-	void focusAt(MemoBoxItem *item, int pos)
-	{
-		focus(item->getEntry());
-		if (pos < 0)
-			elm_entry_cursor_end_set(item->getEntry());
-		else
-			elm_entry_cursor_pos_set(item->getEntry(), pos);
-		runFor(0.03);
-	}
+using BoxControlItemsTest = BoxControlFixture;
 
-	// BackSpace at the start of the item: the first press only notes the cursor at 0, the second acts.
-	void backSpaceAtStart(MemoBoxItem *item)
-	{
-		focusAt(item, 0);
-		pressKey("BackSpace", "\b");
-		pressKey("BackSpace", "\b");
-	}
-
-	void tapOn(Evas_Object *obj)
-	{
-		int x = 0, y = 0;
-		centreOf(obj, &x, &y);
-		tap(x, y);
-	}
-};
-} // namespace
-
-TEST_F(BoxControlItemsTest, BackSpaceMergesIntoTheNeighbourAndKeepsEverything)
-{
-	withBody(todoItem(0, false, "one") + todoItem(1, true, "two") + todoItem(0, false, std::string(2500, 'a')) +
-	         todoItem(0, false, std::string(1500, 'b')));
-	MemoBoxItem *second = items()[1];
-	focusAt(items()[0], 0);
-	pressKey("BackSpace", "\b");
-	ASSERT_EQ(4u, items().size());
-	pressKey("BackSpace", "\b");
-	// The next item takes over the head, and the removed text goes behind its own.
-	ASSERT_EQ(3u, items().size());
-	EXPECT_EQ(second, items()[0]);
-	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, second->getType());
-	EXPECT_EQ("twoone", text(second));
-	EXPECT_EQ(3, elm_entry_cursor_pos_get(second->getEntry()));
-	EXPECT_EQ(second, control->getFocusedItem());
-	EXPECT_EQ(4u, packed().size());
-
-	// A later item goes into the one before; 2,500 and 1,500 characters fit the shared 4,096 and all stay.
-	MemoBoxItem *big = items()[1];
-	backSpaceAtStart(items()[2]);
-	ASSERT_EQ(2u, items().size());
-	EXPECT_EQ(big, items()[1]);
-	EXPECT_EQ(4000u, text(big).size());
-	EXPECT_EQ(2500, elm_entry_cursor_pos_get(big->getEntry()));
-	EXPECT_EQ(todoList(todoItem(1, true, "twoone") + todoItem(0, false, text(big))), document(control));
-
-	// Pictures of the removed item count once: merging 2 into 2, then 6 into those 4, keeps all 10.
-	std::string tags[3];
-	for (int i = 0; i < 10; i++)
-		tags[i < 2 ? 0 : i < 4 ? 1 : 2] += escapedTag(628, 354, mediaDir() + std::to_string(i) + ".png");
-	withBody(todoItem(0, false, tags[0]) + todoItem(0, false, tags[1]) + todoItem(0, false, tags[2]));
-	for (int merge = 0; merge < 2; merge++) {
-		backSpaceAtStart(items()[1]);
-		EXPECT_EQ(10, control->onEntryCheckImageCount()) << merge;
-	}
-	ASSERT_EQ(1u, items().size());
-	EXPECT_EQ(10u, memo_test::countOf(text(items()[0]), "<item"));
-
-	// The only item is never removed; a lone check line asked to go turns into text instead.
-	backSpaceAtStart(items()[0]);
-	ASSERT_EQ(1u, items().size());
-	elm_entry_entry_set(items()[0]->getEntry(), "");
-	items()[0]->changeMode();
-	ASSERT_EQ(MEMO_BOX_ITEM_FIRST_CHECK, items()[0]->getType());
-	control->onUnpackRequested(items()[0]->getEntry(), items()[0]);
-	ASSERT_EQ(1u, items().size());
-	EXPECT_EQ(MEMO_BOX_ITEM_FIRST_TEXT, items()[0]->getType());
-}
-
-TEST_F(BoxControlItemsTest, ReturnOnACheckLineAddsTheNewLineRightBehindItAndNextLeavesTheTitle)
-{
-	withBody(todoItem(1, false, "eggs") + todoItem(1, false, "flour"));
-	MemoBoxItem *eggs = items()[0];
-	MemoBoxItem *flour = items()[1];
-	focusAt(eggs, -1);
-	pressKey("Return", "\r");
-	runFor(0.05);
-
-	ASSERT_EQ(3u, items().size());
-	EXPECT_EQ(eggs, items()[0]);
-	EXPECT_EQ(flour, items()[2]);
-	MemoBoxItem *added = items()[1];
-	EXPECT_EQ(MEMO_BOX_ITEM_CHECK, added->getType());
-	EXPECT_EQ(added, control->getFocusedItem());
-	EXPECT_EQ(added->getEntry(), elm_object_focused_object_get(win));
-	EXPECT_TRUE(elm_entry_input_panel_enabled_get(eggs->getEntry()));
-	// Title, then the items in list order.
-	ASSERT_EQ(4u, packed().size());
-	EXPECT_EQ(added->getLayout(), packed()[2]);
-	typeText("milk");
-	EXPECT_EQ(todoList(todoItem(1, false, "eggs") + todoItem(1, false, "milk") + todoItem(1, false, "flour")),
-	          document(control));
-
-	// Next at the title goes back to the current item, at its end, and adds nothing.
-	focus(control->getTitleItem()->getEntry());
-	typeText("Title");
-	pressKey("Return", "\r");
-	runFor(0.05);
-	EXPECT_EQ(3u, items().size());
-	EXPECT_EQ(added->getEntry(), elm_object_focused_object_get(win));
-	EXPECT_EQ(4, elm_entry_cursor_pos_get(added->getEntry()));
-}
-
-TEST_F(BoxControlItemsTest, AllBodyItemsShareOneBudget)
+TEST_F(BoxControlItemsTest, AllBodyItemsShareOneBudgetAndDoneFollowsThemAndInNewMemosTheTitle)
 {
 	withBody(todoItem(0, false, std::string(4000, 'a')) + todoItem(0, false, ""));
 	MemoBoxItem *big = items()[0];
 	MemoBoxItem *small = items()[1];
 	focusAt(small, -1);
-	clearToasts();
 	elm_entry_entry_insert(small->getEntry(), std::string(100, 'b').c_str());
 	runFor(0.05);
 	EXPECT_EQ(std::string(96, 'b'), text(small));
 	typeText("c");
 	EXPECT_EQ(std::string(96, 'b'), text(small));
-	EXPECT_GE(toastCount(), 1);
+	ASSERT_GE(desktop_toast_log_count(), 1);
+	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"),
+	             desktop_toast_log_get(desktop_toast_log_count() - 1));
 
 	// Moving focus computes the limit again: the big item is full as well.
 	focusAt(big, -1);
@@ -155,14 +43,10 @@ TEST_F(BoxControlItemsTest, AllBodyItemsShareOneBudget)
 	// The title stands outside the budget.
 	focus(control->getTitleItem()->getEntry());
 	typeText("Title");
-	char *title = control->getTitleTextN();
-	EXPECT_STREQ("Title", title);
-	free(title);
-}
+	EXPECT_EQ("Title", titleText());
 
-TEST_F(BoxControlItemsTest, DoneFollowsTheBodyAndInNewModesTheTitle)
-{
-	makeControl(nullptr, MODE_NEW);
+	// Done follows the body, and in a new memo the title as well.
+	remakeControl(nullptr, MODE_NEW);
 	focus(items()[0]->getEntry());
 	typeText("hi");
 	EXPECT_EQ("action,done,enable", lastKey());
@@ -206,16 +90,26 @@ TEST_F(BoxControlItemsTest, KeypadHoldGuideTextAndTapsFollowTheModeAndTheItems)
 	control->resumeKeypad();
 	EXPECT_TRUE(elm_entry_input_panel_enabled_get(title));
 
+	// The guide text shows only on an empty first text block, alone and editable.
 	EXPECT_STRNE("", elm_object_part_text_get(body, "elm.guide"));
+	first->insertText("x");
+	first->showGuideText(true);
+	EXPECT_STREQ("", elm_object_part_text_get(body, "elm.guide"));
+	elm_entry_entry_set(body, "");
 	control->onAddRequested(body, MEMO_BOX_ITEM_CHECK, "x", first);
 	runFor(0.05);
 	control->onCheckGuideText(first);
 	EXPECT_STREQ("", elm_object_part_text_get(body, "elm.guide"));
+	items()[1]->showGuideText(true);
+	EXPECT_STREQ("", elm_object_part_text_get(items()[1]->getEntry(), "elm.guide"));
 
 	// A tap asks for editing only in view mode, where the keypad is never held.
 	tapOn(body);
 	EXPECT_EQ(0, countKey("action,mode,change"));
-	withBody(todoItem(0, false, "read only"), MODE_VIEW);
+	withBody(todoItem(0, false, ""), MODE_VIEW);
+	items()[0]->showGuideText(true);
+	EXPECT_STREQ("", elm_object_part_text_get(items()[0]->getEntry(), "elm.guide"));
+	items()[0]->insertText("read only");
 	control->suspendKeypad();
 	EXPECT_TRUE(elm_entry_input_panel_enabled_get(items()[0]->getEntry()));
 	tapOn(items()[0]->getEntry());

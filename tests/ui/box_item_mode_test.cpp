@@ -1,153 +1,83 @@
-// changeMode and the split at the cursor: which item keeps which text, and the image tags on the way.
+// changeMode and the split at the cursor: which item keeps which text, and the image tags on the way;
+// ticking a check line.
 #include <gtest/gtest.h>
 
-#include <Ecore_File.h>
-
-#include "Util/MemoUtil.h"
-#include "support/BoxItemFixture.h"
+#include "box_control_fixture.h"
 
 using namespace memo_ui_test;
 
-namespace
-{
-class BoxItemModeTest : public BoxItemFixture
-{
-protected:
-	MemoBoxItem *itemWith(_MemoBoxItemType type, const char *markup, int cursor)
-	{
-		MemoBoxItem *item = owner->addItem(type);
-		item->insertText(markup);
-		elm_entry_cursor_pos_set(item->getEntry(), cursor);
-		return item;
-	}
-
-	// The kinds and texts of the owner's items, e.g. "0:l1 1:l2 0:l3".
-	std::string shape() const
-	{
-		std::string out;
-		for (MemoBoxItem *item : owner->items)
-			out += (out.empty() ? "" : " ") + std::to_string(item->getType()) + ":" + text(item);
-		return out;
-	}
-};
-} // namespace
+using BoxItemModeTest = BoxControlFixture;
 
 TEST_F(BoxItemModeTest, SplitsAtTheCursor)
 {
-	struct Case {
-		_MemoBoxItemType type;
-		const char *markup;
+	const std::string one = picture("one.png", 200, 100), two = picture("two.png", 200, 100);
+	const struct {
+		int type;
+		std::string markup;
 		int cursor;
-		const char *shape;
-	};
-	const Case cases[] = {
+		std::string shape;
+	} cases[] = {
 	    // The start of the middle line: text, check, text.
-	    {MEMO_BOX_ITEM_FIRST_TEXT, "l1<br/>l2<br/>l3", 3, "5:l1 1:l2 0:l3"},
+	    {0, "l1<br/>l2<br/>l3", 3, "5:l1 1:l2 0:l3"},
 	    // Inside a word the word is split.
-	    {MEMO_BOX_ITEM_TEXT, "abcd", 2, "0:ab 1:cd"},
+	    {0, "abcd", 2, "5:ab 1:cd"},
 	    // The start or the end of several lines takes the first or the last line.
-	    {MEMO_BOX_ITEM_TEXT, "l1<br/>l2", 0, "1:l1 0:l2"},
-	    {MEMO_BOX_ITEM_TEXT, "l1<br/>l2", 5, "0:l1 1:l2"},
+	    {0, "l1<br/>l2", 0, "2:l1 0:l2"},
+	    {0, "l1<br/>l2", 5, "5:l1 1:l2"},
 	    // Format tags are lost, entities kept.
-	    {MEMO_BOX_ITEM_TEXT, "a&amp;b<br/>c&lt;d", 4, "0:a&amp;b 1:c&lt;d"},
+	    {0, "a&amp;b<br/>c&lt;d", 4, "5:a&amp;b 1:c&lt;d"},
+	    // One line with the cursor at either edge turns whole, either way.
+	    {0, "abcd", 4, "2:abcd"},
+	    {0, "abcd", 0, "2:abcd"},
+	    {1, "abcd", 4, "5:abcd"},
+	    // Each part keeps its own picture; a check line's is narrower, fitted by the filter on the way in.
+	    {0, "x" + tag(628, 354, one) + "<br/>y" + tag(628, 354, two), 3,
+	     "5:x" + tag(628, 354, one) + " 1:y" + tag(521, 300, two)},
 	};
-	for (const Case &c : cases) {
+	for (const auto &c : cases) {
 		SCOPED_TRACE(c.markup);
-		delete owner;
-		owner = new FakeBoxOwner(box);
-		itemWith(c.type, c.markup, c.cursor)->changeMode();
+		withBody(todoItem(c.type, false, c.markup));
+		elm_entry_cursor_pos_set(items()[0]->getEntry(), c.cursor);
+		items()[0]->changeMode();
 		runFor(0.05);
 		EXPECT_EQ(c.shape, shape());
 	}
-}
 
-TEST_F(BoxItemModeTest, OneLineWithTheCursorAtAnEdgeTurnsWhole)
-{
-	MemoBoxItem *atEnd = itemWith(MEMO_BOX_ITEM_FIRST_TEXT, "abcd", 4);
-	atEnd->changeMode();
-	EXPECT_EQ("2:abcd", shape());
-
-	atEnd->changeMode();
-	EXPECT_EQ("5:abcd", shape());
-
-	elm_entry_cursor_pos_set(atEnd->getEntry(), 0);
-	atEnd->changeMode();
-	EXPECT_EQ("2:abcd", shape());
-}
-
-TEST_F(BoxItemModeTest, QuickMemoBodyBecomesAPlainCheck)
-{
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_QUICK_TEXT, "note", 4);
-	item->changeMode();
-	EXPECT_EQ(MEMO_BOX_ITEM_CHECK, item->getType());
-}
-
-TEST_F(BoxItemModeTest, ImageTagsGoBackWhereTheyStood)
-{
-	const std::string folder = std::string(MemoUtil::getDataPath()) + "media/test-memo/";
-	ecore_file_mkpath(folder.c_str());
-	const std::string one = folder + "one.png", two = folder + "two.png";
-	ASSERT_TRUE(writePicture(one, 200, 100));
-	ASSERT_TRUE(writePicture(two, 200, 100));
-	int width = 0;
-	{
-		// Tags at this display's width, so that the filter leaves them as they are.
-		MemoBoxItem *probe = owner->addItem(MEMO_BOX_ITEM_TEXT);
-		probe->insertText(("<item absize=240x180 href=file://" + one + "></item>").c_str());
-		sscanf(text(probe).c_str(), "<item size=%dx", &width);
-		owner->removeItem(probe);
-	}
-	ASSERT_GT(width, 0);
-	char tag1[512], tag2[512];
-	snprintf(tag1, sizeof(tag1), "<item size=%dx140 vsize=full href=file://%s></item>", width, one.c_str());
-	snprintf(tag2, sizeof(tag2), "<item size=%dx140 vsize=full href=file://%s></item>", width, two.c_str());
-
-	// "x" image "<br/>" "y" image: the cursor after the break, so each part keeps its own image.
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_TEXT, (std::string("x") + tag1 + "<br/>y" + tag2).c_str(), 3);
-	item->changeMode();
-	runFor(0.05);
-	ASSERT_EQ(2u, owner->items.size());
-	EXPECT_EQ(std::string("x") + tag1, text(owner->items[0]));
-	EXPECT_EQ(MEMO_BOX_ITEM_CHECK, owner->items[1]->getType());
-	// The check line is narrower: the filter fits the tag to it on the way in.
-	const std::string check = text(owner->items[1]);
-	EXPECT_EQ(0u, check.find("y<item size="));
-	EXPECT_NE(std::string::npos, check.find("href=file://" + two + "></item>"));
-	int checkWidth = 0;
-	sscanf(check.c_str(), "y<item size=%dx", &checkWidth);
-	EXPECT_LT(checkWidth, width);
+	// The empty body of the quick memo becomes a plain check line.
+	record.setIsQuick(1);
+	record.setTizenXmlContent("");
+	remakeControl(&record, MODE_UPDATE);
+	ASSERT_EQ(MEMO_BOX_ITEM_QUICK_TEXT, items()[0]->getType());
+	items()[0]->insertText("note");
+	items()[0]->changeMode();
+	EXPECT_EQ(MEMO_BOX_ITEM_CHECK, items()[0]->getType());
 }
 
 TEST_F(BoxItemModeTest, TickingAStrikesTheTextAndKeepsTheCursor)
 {
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_CHECK, "done", 2);
+	withBody(todoItem(0, false, "text") + todoItem(1, false, "done"));
+	MemoBoxItem *item = items()[1];
+	focusAt(item, 2);
 	EXPECT_FALSE(item->getCheckStatus());
 	EXPECT_STREQ("DEFAULT='color=#000000ff'", elm_entry_text_style_user_peek(item->getEntry()));
-
 	item->setCheckStatus(true);
 	EXPECT_TRUE(item->getCheckStatus());
 	EXPECT_STREQ("DEFAULT='strikethrough=on strikethrough_color=#00000050 color=#00000064'",
 	             elm_entry_text_style_user_peek(item->getEntry()));
+	// Text items have no check state.
+	items()[0]->setCheckStatus(true);
+	EXPECT_FALSE(items()[0]->getCheckStatus());
 
-	// A tap on the box goes through the widget's own toggle and the "changed" callback.
+	// A tap on the box goes through the widget's own toggle and the "changed" callback; the keypad is held
+	// meanwhile, and the line keeps the focus and its cursor.
 	Evas_Object *check = elm_object_part_content_get(item->getInnerLayout(), "check");
 	ASSERT_NE(nullptr, check);
-	int x = 0, y = 0;
-	centreOf(check, &x, &y);
-	tap(x, y);
+	tapOn(check);
 	runFor(0.05);
 	EXPECT_FALSE(item->getCheckStatus());
 	EXPECT_STREQ("DEFAULT='color=#000000ff'", elm_entry_text_style_user_peek(item->getEntry()));
 	EXPECT_EQ(2, elm_entry_cursor_pos_get(item->getEntry()));
-	EXPECT_EQ(1, owner->count("suspend"));
-	EXPECT_EQ(1, owner->count("resume"));
-	EXPECT_EQ(1, owner->count("focuscurrent"));
-}
-
-TEST_F(BoxItemModeTest, TextItemsHaveNoCheckState)
-{
-	MemoBoxItem *item = itemWith(MEMO_BOX_ITEM_TEXT, "x", 0);
-	EXPECT_FALSE(item->getCheckStatus());
-	item->setCheckStatus(true);
-	EXPECT_FALSE(item->getCheckStatus());
+	EXPECT_EQ(item->getEntry(), elm_object_focused_object_get(win));
+	EXPECT_TRUE(elm_entry_input_panel_enabled_get(item->getEntry()));
+	EXPECT_EQ(todoList(todoItem(0, false, "text") + todoItem(1, false, "done")), document(control));
 }

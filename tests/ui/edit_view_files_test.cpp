@@ -23,7 +23,7 @@ TEST_F(EditViewFiles, TenPictureRowsThumbnailFromTheFirstThatExistsStaleFileGoes
 		if (i > 0) {
 			ASSERT_TRUE(writePicture(path, 200, 150));
 		}
-		body += "&lt;item size=200x150 vsize=full href=file://" + path + "&gt;&lt;/item&gt;";
+		body += tag(200, 150, path);
 	}
 	ASSERT_TRUE(writePicture(folder + "stale.jpg", 50, 50));
 

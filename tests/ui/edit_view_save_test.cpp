@@ -107,11 +107,11 @@ TEST_F(EditViewSave, LockedStoreKeepsTheEditorAndDoneSavesOnceItIsFree)
 	typeInto(items(view)[1], "locked out");
 	const pid_t holder = holdLock(15);
 	ASSERT_GT(holder, 0);
-	clearToasts();
+	desktop_toast_log_clear();
 	pressDone(view);
-	EXPECT_TRUE(waitFor([] { return toastCount() > 0; }, 15.0));
+	EXPECT_TRUE(waitFor([] { return desktop_toast_log_count() > 0; }, 15.0));
 	kill(holder, SIGTERM);
-	EXPECT_EQ(i18n_get_text("IDS_MEMO_TPOP_UNABLE_TO_SAVE_MEMO_TRY_AGAIN"), toastAt(0));
+	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_UNABLE_TO_SAVE_MEMO_TRY_AGAIN"), desktop_toast_log_get(0));
 	EXPECT_TRUE(isTop(view));
 	EXPECT_EQ("locked out", textOf(entryOf(items(view)[1])));
 

@@ -9,49 +9,41 @@
 #include <cstdio>
 
 #include "TestEnv.h"
-#include "Util/MemoUtil.h"
-#include "support/FakeBoxOwner.h"
-#include "support/UiTestSupport.h"
+#include "box_control_fixture.h"
 
 using namespace memo_ui_test;
 
 namespace
 {
-class EntryFilterTest : public UiFixture
+class EntryFilterTest : public BoxControlFixture
 {
 protected:
 	void SetUp() override
 	{
-		UiFixture::SetUp();
-		owner = new FakeBoxOwner(box, "filter-memo");
-		item = owner->addItem(MEMO_BOX_ITEM_TEXT);
-		folder = std::string(MemoUtil::getDataPath()) + "media/filter-memo/";
+		BoxControlFixture::SetUp();
+		makeControl(nullptr, MODE_NEW);
+		target = items()[0];
 		elsewhere = std::string(MemoUtil::getDataPath()) + "media/other-memo/";
 		ecore_file_mkpath(elsewhere.c_str());
-		// This display's size for a tag of a missing file, so that the expected texts match it.
-		sscanf(insert("<item size=1x1 vsize=full href=file:///nowhere/p.png></item>").c_str(), "<item size=%dx%d",
-		       &width, &height);
-		insert("");
-		owner->calls.clear();
-		clearToasts();
-	}
-	void TearDown() override
-	{
-		delete owner;
-		UiFixture::TearDown();
 	}
 
-	std::string text() const
+	// The body becomes an empty first item, the target, and one holding `pictures` tags.
+	void withPicturesElsewhere(int pictures)
 	{
-		const char *t = elm_entry_entry_get(item->getEntry());
-		return t ? t : "";
+		std::string tags;
+		for (int i = 0; i < pictures; i++)
+			tags += ghostTag(100 + i);
+		withBody(todoItem(0, false, "") + todoItem(0, false, tags));
+		target = items()[0];
 	}
+
+	std::string shown() const { return text(target); }
 	// The entry's text after `markup` was inserted into the emptied entry.
 	std::string insert(const std::string &markup)
 	{
-		elm_entry_entry_set(item->getEntry(), "");
-		item->insertText(markup.c_str());
-		return text();
+		elm_entry_entry_set(target->getEntry(), "");
+		target->insertText(markup.c_str());
+		return shown();
 	}
 
 	// A tag whose file does not exist, so that no copy or size work gets in the way of the counting.
@@ -87,14 +79,14 @@ protected:
 		return ok;
 	}
 
-	FakeBoxOwner *owner = nullptr;
-	MemoBoxItem *item = nullptr;
-	std::string folder, elsewhere;
-	int width = 0, height = 0;
+	MemoBoxItem *target = nullptr;
+	std::string elsewhere;
+	// A text line's picture width at the test scale, and the height of a tag whose file is missing.
+	const int width = 628, height = 428;
 };
 } // namespace
 
-TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharacters)
+TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharactersAndNeedsBudget)
 {
 	EXPECT_EQ("one<br/>two<br/>three", insert("one\ntwo\nthree"));
 	EXPECT_EQ("big red<br/>left", insert("<font_size=40>big</font_size> <color=#ff0000>red</color><br/>"
@@ -107,38 +99,20 @@ TEST_F(EntryFilterTest, PastedTextLosesFormatNoBreakSpacesAndControlCharacters)
 	                          "b&nbsp;c&#160;d&#xa0;e"));
 	EXPECT_EQ("ab<br/>c", insert("a\x01"
 	                             "b\r\nc\x1b"));
-}
 
-TEST_F(EntryFilterTest, ReturnAfterAPictureKeepsItInPlace)
-{
-	// The split of a line puts pictures back where no-break spaces stand; a pasted one must not be there.
-	MemoBoxItem *check = owner->addItem(MEMO_BOX_ITEM_CHECK);
-	check->insertText(("a&nbsp;b" + ghostTag(1)).c_str());
-	const std::string line = elm_entry_entry_get(check->getEntry());
-	focus(check->getEntry());
-	elm_entry_cursor_end_set(check->getEntry());
-	pressKey("Return", "\r");
-	runFor(0.05);
-	EXPECT_EQ(line, elm_entry_entry_get(check->getEntry()));
-	EXPECT_EQ(0u, line.find("ab<item size="));
-	EXPECT_EQ(1, owner->count("add:1:"));
-}
-
-TEST_F(EntryFilterTest, NoBudgetNothingEntersAndTypingCountsNoImages)
-{
-	focus(item->getEntry());
+	// Without budget nothing enters, and a toast says so.
+	insert("");
+	focus(target->getEntry());
 	typeText("kept");
-	item->setLimit(0);
-	item->insertText("more");
-	EXPECT_EQ("kept", text());
-	ASSERT_EQ(1, toastCount());
-	EXPECT_EQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), toastAt(0));
-	EXPECT_EQ(0, owner->count("count"));
+	target->setLimit(0);
+	target->insertText("more");
+	EXPECT_EQ("kept", shown());
+	ASSERT_EQ(1, desktop_toast_log_count());
+	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_CANT_ENTER_MORE_CHARACTERS"), desktop_toast_log_get(0));
 }
 
-TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
+TEST_F(EntryFilterTest, TagsAreMendedForbiddenSourcesGoOnlyInFrontAndTheCountIsLimited)
 {
-	ASSERT_GT(width, 1);
 	const std::string base = ghostOpen("file:///nowhere/a.png");
 	EXPECT_EQ(base + "></item>x", insert(base + ">x"));
 	EXPECT_EQ(base + "></item>x", insert(base + "></item></item>x"));
@@ -151,55 +125,50 @@ TEST_F(EntryFilterTest, TagsAreMendedAndForbiddenSourcesGoOnlyInFront)
 	EXPECT_EQ("a" + good + "b", insert("a" + web + data + good + "b"));
 	// Behind a good tag the walk has stopped: this one survives the step.
 	EXPECT_EQ(good + web, insert(good + web));
-}
 
-TEST_F(EntryFilterTest, ImageCountLimits)
-{
+	// The limit of ten pictures, against the count of the memo's other items.
 	std::string twelve;
 	for (int i = 0; i < 12; i++)
 		twelve += ghostTag(i);
 	char limitToast[256];
 	snprintf(limitToast, sizeof(limitToast), i18n_get_text("IDS_MEMO_TPOP_CANT_INSERT_MORE_THAN_PD_IMAGES"), 10);
 	// A memo with no images takes eleven, one toast for the rest.
-	owner->imageCount = -1;
 	const std::string kept = insert(twelve);
 	EXPECT_EQ(11u, memo_test::countOf(kept, "<item"));
 	EXPECT_NE(std::string::npos, kept.find("/nowhere/10.png"));
 	EXPECT_EQ(std::string::npos, kept.find("/nowhere/11.png"));
-	ASSERT_EQ(1, toastCount());
-	EXPECT_EQ(limitToast, toastAt(0));
+	ASSERT_EQ(1, desktop_toast_log_count());
+	EXPECT_STREQ(limitToast, desktop_toast_log_get(0));
 	// A memo with one stops at ten in all.
-	owner->imageCount = 1;
+	withPicturesElsewhere(1);
 	EXPECT_EQ(9u, memo_test::countOf(insert(twelve), "<item"));
-	EXPECT_EQ(2, toastCount());
+	EXPECT_EQ(1, desktop_toast_log_count());
 	// A full memo takes none, with a toast for each refusal.
-	owner->imageCount = 10;
+	withPicturesElsewhere(10);
 	EXPECT_EQ("ab", insert("a" + ghostTag(1) + ghostTag(2) + "b"));
-	EXPECT_EQ(4, toastCount());
+	EXPECT_EQ(2, desktop_toast_log_count());
 }
 
-TEST_F(EntryFilterTest, SizedTagsAreFittedAndTakenIntoTheMemo)
+TEST_F(EntryFilterTest, PicturesFromElsewhereAreTakenIntoTheMemoAndFitted)
 {
 	const std::string source = elsewhere + "photo.png";
 	ASSERT_TRUE(writePicture(source, 200, 100));
 	const std::string path = pathOf(insert(fittedTag(source, 200, 100)));
-	ASSERT_EQ(0u, path.find(folder)) << text();
+	ASSERT_EQ(0u, path.find(mediaDir())) << shown();
 	EXPECT_TRUE(eina_str_has_extension(path.c_str(), ".png"));
 	EXPECT_TRUE(ecore_file_exists(path.c_str()));
 	EXPECT_TRUE(ecore_file_exists(source.c_str()));
-	EXPECT_EQ(0, owner->count("popup:"));
+	EXPECT_EQ(0, countKey("action,imagepopup,show"));
 	// A tag already at home keeps its file; a width of another display is fitted to this one.
 	EXPECT_EQ(fittedTag(path, 200, 100), insert("<item size=100x90 vsize=full href=file://" + path + "></item>"));
-}
 
-TEST_F(EntryFilterTest, APasteOfTheFixedSizeIsRebuiltWhenItsFileExists)
-{
-	const std::string source = elsewhere + "pasted.jpg";
-	ASSERT_TRUE(writePicture(source, 300, 200));
-	const std::string path = pathOf(insert("a<item absize=240x180 href=file://" + source + "></item>b"));
-	ASSERT_EQ(0u, path.find(folder)) << text();
-	EXPECT_TRUE(eina_str_has_extension(path.c_str(), ".jpg"));
-	EXPECT_EQ("a" + fittedTag(path, 300, 200) + "b", text());
+	// A paste of the fixed size is rebuilt when its file exists.
+	const std::string pasted = elsewhere + "pasted.jpg";
+	ASSERT_TRUE(writePicture(pasted, 300, 200));
+	const std::string copy = pathOf(insert("a<item absize=240x180 href=file://" + pasted + "></item>b"));
+	ASSERT_EQ(0u, copy.find(mediaDir())) << shown();
+	EXPECT_TRUE(eina_str_has_extension(copy.c_str(), ".jpg"));
+	EXPECT_EQ("a" + fittedTag(copy, 300, 200) + "b", shown());
 	const std::string gone = "<item absize=240x180 href=file:///nowhere/gone.jpg></item>";
 	EXPECT_EQ(gone, insert(gone));
 }
@@ -211,8 +180,8 @@ TEST_F(EntryFilterTest, LargePicturesAreShrunkOnWorkers)
 	const std::string big = elsewhere + "big.png";
 	ASSERT_TRUE(writePicture(big, 1000, 800));
 	const std::string copy = pathOf(insert(fittedTag(big, 1000, 800)));
-	ASSERT_EQ(0u, copy.find(folder)) << text();
-	EXPECT_EQ(0, owner->count("popup:"));
+	ASSERT_EQ(0u, copy.find(mediaDir())) << shown();
+	EXPECT_EQ(0, countKey("action,imagepopup,show"));
 	int w = 0, h = 0;
 	ASSERT_TRUE(waitFor([&] { return pictureSize(copy, &w, &h) && w * h <= 320000; }, 20.0));
 
@@ -220,22 +189,22 @@ TEST_F(EntryFilterTest, LargePicturesAreShrunkOnWorkers)
 	const std::string source = elsewhere + "large.jpg";
 	ASSERT_TRUE(writePicture(source, 1200, 900));
 	EXPECT_EQ("", insert("hello<item absize=240x180 href=file://" + source + "></item>"));
-	ASSERT_EQ(1, owner->count("popup:1"));
-	EXPECT_EQ(0, owner->count("popup:0"));
-	ASSERT_TRUE(waitFor([&] { return !text().empty(); }, 20.0));
-	EXPECT_EQ(0u, text().find("hello<item size="));
-	EXPECT_EQ(1, owner->count("popup:0"));
+	ASSERT_EQ(1, countKey("action,imagepopup,show"));
+	EXPECT_EQ(0, countKey("action,imagepopup,hide"));
+	ASSERT_TRUE(waitFor([&] { return !shown().empty(); }, 20.0));
+	EXPECT_EQ(0u, shown().find("hello<item size="));
+	EXPECT_EQ(1, countKey("action,imagepopup,hide"));
 	// The picture in the memo's folder has been shrunk below the insertion limit; the original is untouched.
-	ASSERT_TRUE(pictureSize(pathOf(text()), &w, &h));
+	ASSERT_TRUE(pictureSize(pathOf(shown()), &w, &h));
 	EXPECT_LE(w * h, 320000);
 	ASSERT_TRUE(pictureSize(source, &w, &h));
 	EXPECT_EQ(1200, w);
 
-	// An item deleted during the wait is left alone.
+	// An editor closed during the wait leaves the worker's end alone.
 	insert("x<item absize=240x180 href=file://" + source + "></item>");
-	ASSERT_EQ(2, owner->count("popup:1"));
-	owner->removeItem(item);
-	item = nullptr;
-	runFor(2.0);
-	EXPECT_EQ(1, owner->count("popup:0"));
+	ASSERT_EQ(2, countKey("action,imagepopup,show"));
+	UiFixture::TearDown();
+	ASSERT_TRUE(waitFor([] { return ecore_thread_active_get() == 0; }, 20.0));
+	runFor(0.05);
+	EXPECT_EQ(1, countKey("action,imagepopup,hide"));
 }

@@ -3,8 +3,6 @@
 
 #include "app_private.h"
 
-#include <desktop/app_launch.h>
-
 #include <dlog.h>
 #include <errno.h>
 #include <stdlib.h>
@@ -15,30 +13,15 @@
 
 #define LAUNCH_TIMEOUT_SEC 5.0
 #define LAUNCH_POLL_USEC 20000
-/* How long a sent message may wait for its receiver to take it. */
-#define DELIVERY_TIMEOUT_SEC 5.0
 
 /* A sent request that waits for its reply on its own connection. */
 typedef struct {
-	Ecore_Ipc_Server *server;
 	int ref;
 	app_control_h request;
 	app_control_reply_cb callback;
 	void *user_data;
 } pending_reply_s;
 
-static Eina_List *pending_replies;
-
-/* A connection that carried a message needing no answer. It stays open until the receiver closes
-   it: closing it here first could lose the message on the way. */
-typedef struct {
-	Ecore_Ipc_Server *server;
-	Ecore_Timer *timer;
-} closing_s;
-
-static Eina_List *closing_connections;
-static Ecore_Event_Handler *data_handler;
-static Ecore_Event_Handler *del_handler;
 static int last_ref;
 
 static int launch_error(int code, const char *what, const char *app_id)
@@ -54,37 +37,6 @@ static double monotonic_now(void)
 	return ts.tv_sec + ts.tv_nsec / 1e9;
 }
 
-static void pending_free(pending_reply_s *p)
-{
-	app_control_destroy(p->request);
-	free(p);
-}
-
-/* The connection is closed once nothing waits on it any more. */
-static void server_release_if_unused(Ecore_Ipc_Server *server)
-{
-	Eina_List *l;
-	pending_reply_s *p;
-	EINA_LIST_FOREACH(pending_replies, l, p)
-	if (p->server == server)
-		return;
-	ecore_ipc_server_del(server);
-}
-
-static pending_reply_s *pending_take(Ecore_Ipc_Server *server, int ref)
-{
-	Eina_List *l;
-	pending_reply_s *p;
-	EINA_LIST_FOREACH(pending_replies, l, p)
-	{
-		if (p->server == server && (ref < 0 || p->ref == ref)) {
-			pending_replies = eina_list_remove_list(pending_replies, l);
-			return p;
-		}
-	}
-	return NULL;
-}
-
 static void pending_answer(pending_reply_s *p, app_control_h reply, app_control_result_e result)
 {
 	app_control_h empty = NULL;
@@ -94,133 +46,43 @@ static void pending_answer(pending_reply_s *p, app_control_h reply, app_control_
 		p->callback(p->request, reply, result, p->user_data);
 	if (empty)
 		app_control_destroy(empty);
+}
+
+static void pending_free(pending_reply_s *p)
+{
+	app_control_destroy(p->request);
+	free(p);
+}
+
+static void reply_message_cb(void *data, app_message_reader_s *reader, const app_message_s *msg)
+{
+	pending_reply_s *p = data;
+	if (!msg) {
+		LOGI("the callee closed the request without replying");
+		pending_answer(p, NULL, APP_CONTROL_RESULT_CANCELED);
+		pending_free(p);
+		return;
+	}
+	if (msg->major != APP_CHANNEL_MSG_REPLY || msg->ref != p->ref)
+		return;
+	app_control_h reply = msg->size > 0 ? app_control_decode_internal(msg->data, msg->size) : NULL;
+	if (msg->size > 0 && !reply)
+		LOGE("malformed reply from the callee");
+	pending_answer(p, reply, (app_control_result_e)msg->response);
+	if (reply)
+		app_control_destroy(reply);
+	/* One reply per request: the connection ends here, and with it this call's last use of p. */
+	app_message_reader_del(reader);
 	pending_free(p);
 }
 
-/* The event handlers live only while a connection of ours is open. */
-static void handlers_release_if_idle(void)
+/* Sends one message on fd and closes it; what the receiver still has to read stays in its socket. */
+static int send_and_close(int fd, int major, int ref, const void *data, int size)
 {
-	if (pending_replies || closing_connections || !data_handler)
-		return;
-	ecore_event_handler_del(data_handler);
-	ecore_event_handler_del(del_handler);
-	data_handler = NULL;
-	del_handler = NULL;
-}
-
-static Eina_Bool server_data_cb(void *data, int type, void *event)
-{
-	(void)data;
-	(void)type;
-	Ecore_Ipc_Event_Server_Data *ev = event;
-	if (ev->major != APP_CHANNEL_MSG_REPLY)
-		return ECORE_CALLBACK_PASS_ON;
-	pending_reply_s *p = pending_take(ev->server, ev->ref_to);
-	if (!p)
-		return ECORE_CALLBACK_PASS_ON;
-	app_control_h reply = ev->size > 0 ? app_control_decode_internal(ev->data, ev->size) : NULL;
-	if (ev->size > 0 && !reply)
-		LOGE("malformed reply from the callee");
-	Ecore_Ipc_Server *server = p->server;
-	pending_answer(p, reply, (app_control_result_e)ev->response);
-	if (reply)
-		app_control_destroy(reply);
-	server_release_if_unused(server);
-	handlers_release_if_idle();
-	return ECORE_CALLBACK_DONE;
-}
-
-static void closing_free(closing_s *c)
-{
-	closing_connections = eina_list_remove(closing_connections, c);
-	if (c->timer)
-		ecore_timer_del(c->timer);
-	ecore_ipc_server_del(c->server);
-	free(c);
-}
-
-static closing_s *closing_find(Ecore_Ipc_Server *server)
-{
-	Eina_List *l;
-	closing_s *c;
-	EINA_LIST_FOREACH(closing_connections, l, c)
-	if (c->server == server)
-		return c;
-	return NULL;
-}
-
-static Eina_Bool closing_timeout_cb(void *data)
-{
-	closing_s *c = data;
-	c->timer = NULL;
-	LOGE("the receiver did not take a message in time");
-	closing_free(c);
-	handlers_release_if_idle();
-	return ECORE_CALLBACK_CANCEL;
-}
-
-static Eina_Bool server_del_cb(void *data, int type, void *event)
-{
-	(void)data;
-	(void)type;
-	Ecore_Ipc_Event_Server_Del *ev = event;
-	closing_s *c = closing_find(ev->server);
-	if (c) {
-		closing_free(c);
-		handlers_release_if_idle();
-		return ECORE_CALLBACK_DONE;
-	}
-	pending_reply_s *p;
-	bool ours = false;
-	while ((p = pending_take(ev->server, -1))) {
-		LOGI("the callee closed the request without replying");
-		ours = true;
-		pending_answer(p, NULL, APP_CONTROL_RESULT_CANCELED);
-	}
-	if (!ours)
-		return ECORE_CALLBACK_PASS_ON;
-	ecore_ipc_server_del(ev->server);
-	handlers_release_if_idle();
-	return ECORE_CALLBACK_DONE;
-}
-
-static void handlers_install(void)
-{
-	if (data_handler)
-		return;
-	data_handler = ecore_event_handler_add(ECORE_IPC_EVENT_SERVER_DATA, server_data_cb, NULL);
-	del_handler = ecore_event_handler_add(ECORE_IPC_EVENT_SERVER_DEL, server_del_cb, NULL);
-}
-
-/* Sends one message and leaves the connection to the receiver to close; false if it could not be sent. */
-static bool send_and_release(Ecore_Ipc_Server *server, int major, int ref, const void *data, int size)
-{
-	int sent = ecore_ipc_server_send(server, major, 0, ref, 0, 0, data, size);
-	if (sent <= 0) {
-		ecore_ipc_server_del(server);
-		return false;
-	}
-	ecore_ipc_server_flush(server);
-	closing_s *c = calloc(1, sizeof(*c));
-	if (!c) {
-		ecore_ipc_server_del(server);
-		return true;
-	}
-	handlers_install();
-	c->server = server;
-	c->timer = ecore_timer_add(DELIVERY_TIMEOUT_SEC, closing_timeout_cb, c);
-	closing_connections = eina_list_append(closing_connections, c);
-	return true;
-}
-
-int desktop_app_launch_drain(double timeout_sec)
-{
-	double end = monotonic_now() + timeout_sec;
-	while (closing_connections && monotonic_now() < end) {
-		ecore_main_loop_iterate();
-		usleep(1000);
-	}
-	return closing_connections ? APP_CONTROL_ERROR_TIMED_OUT : APP_CONTROL_ERROR_NONE;
+	app_message_s msg = {major, ref, 0, size, data};
+	int ret = app_message_send(fd, &msg, APP_MESSAGE_SEND_TIMEOUT_SEC);
+	close(fd);
+	return ret;
 }
 
 typedef struct {
@@ -248,8 +110,8 @@ static char *target_resolve(app_control_h app_control)
 	return m.found;
 }
 
-/* Starts the app and waits until it listens; APP_CONTROL_ERROR_NONE with *server set. */
-static int start_and_connect(const char *app_id, Ecore_Ipc_Server **server)
+/* Starts the app and waits until it listens; APP_CONTROL_ERROR_NONE with *fd set. */
+static int start_and_connect(const char *app_id, int *fd)
 {
 	app_registry_entry_s *entry = app_registry_find(app_id);
 	if (!entry)
@@ -260,7 +122,10 @@ static int start_and_connect(const char *app_id, Ecore_Ipc_Server **server)
 		return launch_error(APP_CONTROL_ERROR_LAUNCH_FAILED, "cannot start the app", app_id);
 
 	double end = monotonic_now() + LAUNCH_TIMEOUT_SEC;
-	while (!(*server = app_channel_connect(app_id))) {
+	for (;;) {
+		int ret = app_channel_connect(app_id, fd);
+		if (ret != APP_CONTROL_ERROR_APP_NOT_FOUND)
+			return ret == APP_CONTROL_ERROR_NONE ? ret : launch_error(ret, "the app takes no connection", app_id);
 		int status;
 		pid_t r = waitpid(pid, &status, WNOHANG);
 		if (r == pid || (r < 0 && errno == ECHILD))
@@ -269,22 +134,24 @@ static int start_and_connect(const char *app_id, Ecore_Ipc_Server **server)
 			return launch_error(APP_CONTROL_ERROR_TIMED_OUT, "the app did not take requests in time", app_id);
 		usleep(LAUNCH_POLL_USEC);
 	}
-	return APP_CONTROL_ERROR_NONE;
 }
 
 /* A connection to the running target, starting it when needed. */
-static int target_connect(const char *app_id, Ecore_Ipc_Server **server)
+static int target_connect(const char *app_id, int *fd)
 {
-	*server = app_channel_connect(app_id);
-	if (*server)
-		return APP_CONTROL_ERROR_NONE;
-	return start_and_connect(app_id, server);
+	int ret = app_channel_connect(app_id, fd);
+	if (ret != APP_CONTROL_ERROR_APP_NOT_FOUND)
+		return ret == APP_CONTROL_ERROR_NONE ? ret : launch_error(ret, "the app takes no connection", app_id);
+	return start_and_connect(app_id, fd);
 }
 
 int app_control_send_launch_request(app_control_h app_control, app_control_reply_cb callback, void *user_data)
 {
 	if (!app_control)
 		return launch_error(APP_CONTROL_ERROR_INVALID_PARAMETER, "invalid parameter", NULL);
+	/* No app named: the registered apps that take the operation, picked by the user when several do. */
+	if (!app_control->app_id && app_control->operation)
+		return app_chooser_send(app_control, callback, user_data);
 	char *app_id = target_resolve(app_control);
 	if (!app_id)
 		return launch_error(APP_CONTROL_ERROR_APP_NOT_FOUND, "no registered app takes the operation",
@@ -294,8 +161,8 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 	if (!app_control->operation)
 		app_control_set_operation(app_control, APP_CONTROL_OPERATION_DEFAULT);
 
-	Ecore_Ipc_Server *server = NULL;
-	int ret = target_connect(app_id, &server);
+	int fd = -1;
+	int ret = target_connect(app_id, &fd);
 	bundle_raw *raw = NULL;
 	int len = 0;
 	char *caller = NULL;
@@ -305,31 +172,37 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 			ret = launch_error(APP_CONTROL_ERROR_OUT_OF_MEMORY, "cannot encode the request", app_id);
 	}
 	int ref = ++last_ref;
-	if (ret == APP_CONTROL_ERROR_NONE && !callback) {
-		if (!send_and_release(server, APP_CHANNEL_MSG_LAUNCH, ref, raw, len))
-			ret = launch_error(APP_CONTROL_ERROR_IO_ERROR, "cannot send the request", app_id);
-		server = NULL;
-	} else if (ret == APP_CONTROL_ERROR_NONE) {
-		pending_reply_s *p = calloc(1, sizeof(*p));
+	pending_reply_s *p = NULL;
+	if (ret == APP_CONTROL_ERROR_NONE && callback) {
+		p = calloc(1, sizeof(*p));
 		if (!p || app_control_clone(&p->request, app_control) != APP_CONTROL_ERROR_NONE) {
 			free(p);
+			p = NULL;
 			ret = launch_error(APP_CONTROL_ERROR_OUT_OF_MEMORY, "cannot keep the request", app_id);
-		} else if (ecore_ipc_server_send(server, APP_CHANNEL_MSG_LAUNCH, 0, ref, 0, 1, raw, len) <= 0) {
-			pending_free(p);
-			ret = launch_error(APP_CONTROL_ERROR_IO_ERROR, "cannot send the request", app_id);
-		} else {
-			ecore_ipc_server_flush(server);
-			p->server = server;
-			p->ref = ref;
-			p->callback = callback;
-			p->user_data = user_data;
-			handlers_install();
-			pending_replies = eina_list_append(pending_replies, p);
-			server = NULL; /* kept until the reply */
 		}
 	}
-	if (server)
-		ecore_ipc_server_del(server);
+	if (ret == APP_CONTROL_ERROR_NONE) {
+		app_message_s msg = {APP_CHANNEL_MSG_LAUNCH, ref, callback ? 1 : 0, len, raw};
+		ret = app_message_send(fd, &msg, APP_MESSAGE_SEND_TIMEOUT_SEC);
+		if (ret != APP_CONTROL_ERROR_NONE)
+			launch_error(ret, "the app did not take the request", app_id);
+	}
+	if (ret == APP_CONTROL_ERROR_NONE && p) {
+		/* The reply comes back on this connection. */
+		p->ref = ref;
+		p->callback = callback;
+		p->user_data = user_data;
+		app_message_reader_s *reader = app_message_reader_add(fd, true, reply_message_cb, p);
+		fd = -1;
+		if (!reader) {
+			pending_free(p);
+			ret = launch_error(APP_CONTROL_ERROR_OUT_OF_MEMORY, "cannot wait for the reply", app_id);
+		}
+	} else if (p) {
+		pending_free(p);
+	}
+	if (fd >= 0)
+		close(fd);
 	if (ret == APP_CONTROL_ERROR_NONE)
 		LOGI("launch request sent to %s (%s)", app_id,
 		     app_control->operation ? app_control->operation : "no operation");
@@ -342,10 +215,9 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 /* Sends a message without payload to a running app. */
 static int send_simple(const char *app_id, int major)
 {
-	Ecore_Ipc_Server *server = app_channel_connect(app_id);
-	if (!server)
-		return APP_CONTROL_ERROR_APP_NOT_FOUND;
-	return send_and_release(server, major, 0, NULL, 0) ? APP_CONTROL_ERROR_NONE : APP_CONTROL_ERROR_IO_ERROR;
+	int fd = -1;
+	int ret = app_channel_connect(app_id, &fd);
+	return ret == APP_CONTROL_ERROR_NONE ? send_and_close(fd, major, 0, NULL, 0) : ret;
 }
 
 int app_control_send_terminate_request(app_control_h app_control)
@@ -366,18 +238,18 @@ int app_channel_send_resume(const char *app_id)
 
 int app_launch_forward(app_control_h request, const char *app_id)
 {
-	Ecore_Ipc_Server *server = app_channel_connect(app_id);
-	if (!server)
-		return APP_CONTROL_ERROR_APP_NOT_FOUND;
+	int fd = -1;
+	int ret = app_channel_connect(app_id, &fd);
+	if (ret != APP_CONTROL_ERROR_NONE)
+		return ret;
 	char *caller = app_paths_app_id_get();
 	bundle_raw *raw = NULL;
 	int len = 0;
-	int ret = APP_CONTROL_ERROR_NONE;
-	if (!app_control_encode_internal(request, caller, false, &raw, &len)) {
-		ecore_ipc_server_del(server);
+	if (app_control_encode_internal(request, caller, false, &raw, &len)) {
+		ret = send_and_close(fd, APP_CHANNEL_MSG_LAUNCH, ++last_ref, raw, len);
+	} else {
+		close(fd);
 		ret = APP_CONTROL_ERROR_OUT_OF_MEMORY;
-	} else if (!send_and_release(server, APP_CHANNEL_MSG_LAUNCH, ++last_ref, raw, len)) {
-		ret = APP_CONTROL_ERROR_IO_ERROR;
 	}
 	free(raw);
 	free(caller);

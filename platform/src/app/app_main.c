@@ -4,8 +4,6 @@
 
 #include "app_private.h"
 
-#include <desktop/app_launch.h>
-
 #include <dlog.h>
 #include <stdlib.h>
 #include <string.h>
@@ -22,6 +20,7 @@ static struct {
 	void *user_data;
 	app_control_h argv_request;
 	Ecore_Timer *wait_timer;
+	Ecore_Event_Handler *signal_exit_handler;
 	Eina_List *hooked_windows;
 } app;
 
@@ -176,6 +175,17 @@ static void windows_unhook_all(void)
 		win_unhook(eina_list_data_get(app.hooked_windows));
 }
 
+/* SIGTERM, SIGINT and SIGQUIT end the app like a closed window: terminate runs, so nothing open is lost. */
+static Eina_Bool signal_exit_cb(void *data, int type, void *event)
+{
+	(void)data;
+	(void)type;
+	(void)event;
+	LOGI("asked to end by a signal");
+	ui_app_exit();
+	return ECORE_CALLBACK_PASS_ON;
+}
+
 /* ---- requests ---- */
 
 bool app_main_is_running(void)
@@ -224,11 +234,8 @@ static Eina_Bool first_request_timeout_cb(void *data)
 /* Hands the command-line request to the running instance of app_id; false when there is none. */
 static bool forward_to_running(const char *app_id)
 {
-	int ret = app_launch_forward(app.argv_request, app_id);
-	if (ret != APP_CONTROL_ERROR_NONE)
+	if (app_launch_forward(app.argv_request, app_id) != APP_CONTROL_ERROR_NONE)
 		return false;
-	if (desktop_app_launch_drain(FIRST_REQUEST_WAIT_SEC) != APP_CONTROL_ERROR_NONE)
-		LOGE("%s did not take the request in time", app_id);
 	LOGI("%s is running already: request handed over", app_id);
 	return true;
 }
@@ -245,6 +252,7 @@ static bool app_run(void)
 {
 	app_event_language_apply();
 	app_event_watch_start();
+	app.signal_exit_handler = ecore_event_handler_add(ECORE_EVENT_SIGNAL_EXIT, signal_exit_cb, NULL);
 	bool created = !app.callback.create || app.callback.create(app.user_data);
 	if (created && !app.exit_requested) {
 		windows_hook(true);
@@ -271,6 +279,8 @@ static bool app_run(void)
 	}
 	windows_unhook_all();
 	app_event_watch_stop();
+	ecore_event_handler_del(app.signal_exit_handler);
+	app.signal_exit_handler = NULL;
 	return created;
 }
 

@@ -58,7 +58,7 @@ int app_manager_get_app_context(const char *app_id, app_context_h *app_context)
 		return INVALID_PARAMETER();
 	if (!app_channel_is_running(app_id))
 		return manager_error(APP_MANAGER_ERROR_NO_SUCH_APP, __func__, "the app is not running");
-	*app_context = context_new(app_id, app_server_pid_get(app_id));
+	*app_context = context_new(app_id, app_channel_owner_pid(app_id));
 	return *app_context ? APP_MANAGER_ERROR_NONE : APP_MANAGER_ERROR_OUT_OF_MEMORY;
 }
 

@@ -8,7 +8,6 @@
 #include <sys/types.h>
 
 #include <Ecore.h>
-#include <Ecore_Ipc.h>
 #include <Evas.h>
 
 #ifdef __cplusplus
@@ -39,6 +38,7 @@ typedef struct {
 	char *label;
 	char *icon;
 	char *operations; /* comma-separated, may be NULL */
+	char *mimes;      /* comma-separated, may be NULL: then any */
 } app_registry_entry_s;
 
 /* Looks the id up in TIZEN_APPS_DIR (colon-separated), the installed tree's folder and then the built-in one;
@@ -48,9 +48,19 @@ app_registry_entry_s *app_registry_find(const char *app_id);
 void app_registry_foreach(bool (*cb)(const app_registry_entry_s *entry, void *data), void *data);
 /* True when the entry handles the operation (an entry without operations takes none). */
 bool app_registry_entry_handles(const app_registry_entry_s *entry, const char *operation);
+/* True when the entry handles the operation and, for a request with a mime type, declares no mime types
+   or one that matches it (a "*" subtype matches every subtype of its type, either way round). */
+bool app_registry_entry_takes(const app_registry_entry_s *entry, const char *operation, const char *mime);
 void app_registry_entry_free(app_registry_entry_s *entry);
 /* Starts the entry's program with TIZEN_APP_ID=<id> and the "wait for the request" mark; pid or -1 (logged). */
 pid_t app_registry_spawn(const app_registry_entry_s *entry);
+
+/* ---- requests without an app id (app_chooser.c) ---- */
+
+/* Sends a request that names an operation but no app: to the one registered app that takes it, or,
+   when several do, to the one the user picks in a chooser window (the reply callback then answers
+   "canceled" when the chooser is closed). APP_CONTROL_ERROR_APP_NOT_FOUND when none takes it. */
+int app_chooser_send(app_control_h request, app_control_reply_cb callback, void *user_data);
 
 /* ---- handle internals (app_control.c) ---- */
 
@@ -76,24 +86,59 @@ app_control_h app_control_decode_internal(const bundle_raw *raw, int len);
 /* True for keys the platform keeps for itself. */
 bool app_control_key_is_reserved(const char *key);
 
-/* ---- launch channel (app_channel.c) ---- */
+/* ---- messages on launch sockets (app_message.c) ---- */
+
+/* How long one message may take to be handed over before its receiver counts as stopped or gone. */
+#define APP_MESSAGE_SEND_TIMEOUT_SEC 2.0
 
 /* Message kinds on an app's launch socket. */
 enum {
 	APP_CHANNEL_MSG_LAUNCH = 1, /* ref: request number, response: 1 if a reply is wanted, data: request */
-	APP_CHANNEL_MSG_REPLY = 2,  /* ref_to: request number, response: result, data: reply */
+	APP_CHANNEL_MSG_REPLY = 2,  /* ref: the request answered, response: result, data: reply */
 	APP_CHANNEL_MSG_TERMINATE = 3,
 	APP_CHANNEL_MSG_RESUME = 4,
 };
 
-/* Socket name of an app's launch channel (malloc'ed). */
-char *app_channel_name_get(const char *app_id);
-/* Removes the socket file of the channel name when nobody listens on it any more. */
-void app_channel_stale_remove(const char *name);
-/* A connection to the running app, or NULL when it is not running. */
-Ecore_Ipc_Server *app_channel_connect(const char *app_id);
-/* True when an app with this id answers on its launch socket. */
+typedef struct {
+	int major;
+	int ref;
+	int response;
+	int size;
+	const void *data;
+} app_message_s;
+
+/* Writes one message on a connected socket without blocking for longer than timeout_sec:
+   APP_CONTROL_ERROR_NONE once the receiver's socket holds all of it, TIMED_OUT when it took nothing
+   more for that long (stopped or hung), IO_ERROR when it is gone. After a failure the connection
+   is unusable (a message may be cut): the caller closes it. Logs failures. */
+int app_message_send(int fd, const app_message_s *msg, double timeout_sec);
+
+typedef struct app_message_reader_s app_message_reader_s;
+/* Gets each whole message, then NULL once when the connection ends; the reader is freed after that call. */
+typedef void (*app_message_cb)(void *data, app_message_reader_s *reader, const app_message_s *msg);
+
+/* Reads messages from fd, which it owns; NULL (fd closed) on failure. With watch, it reads whenever data
+   comes on the main loop; without, only when its owner calls app_message_reader_read. */
+app_message_reader_s *app_message_reader_add(int fd, bool watch, app_message_cb callback, void *data);
+/* Reads what has come and hands whole messages over; false when the connection ended (reader freed). */
+bool app_message_reader_read(app_message_reader_s *reader);
+int app_message_reader_fd_get(const app_message_reader_s *reader);
+/* Closes the connection; allowed inside the reader's own callback. */
+void app_message_reader_del(app_message_reader_s *reader);
+
+/* ---- launch channel (app_channel.c) ---- */
+
+/* Connects to the launch socket of a running app: APP_CONTROL_ERROR_NONE with a non-blocking *fd,
+   APP_NOT_FOUND when nobody listens there, TIMED_OUT when the app takes no connection in time. */
+int app_channel_connect(const char *app_id, int *fd);
+/* True when an app with this id listens on its launch socket. */
 bool app_channel_is_running(const char *app_id);
+/* This app's listening launch socket (non-blocking), or -1 when another instance owns it. */
+int app_channel_listen(const char *app_id);
+/* Closes the listening socket and gives up the ownership taken by app_channel_listen. */
+void app_channel_unlisten(const char *app_id, int fd);
+/* Pid of the process that owns app_id's launch socket, or -1. */
+pid_t app_channel_owner_pid(const char *app_id);
 /* Asks a running app to bring its windows to the front; APP_CONTROL_ERROR_* (APP_NOT_FOUND if not running). */
 int app_channel_send_resume(const char *app_id);
 /* Sends a request to an already running app_id, never starting it; APP_CONTROL_ERROR_*. */
@@ -106,8 +151,6 @@ bool app_server_start(const char *app_id);
 void app_server_stop(void);
 /* Sends the reply of a received request; APP_CONTROL_ERROR_* */
 int app_server_reply(unsigned int reply_token, app_control_h reply, app_control_result_e result);
-/* Pid of the running instance of app_id (from its pid file), or -1. */
-pid_t app_server_pid_get(const char *app_id);
 
 /* ---- lifecycle hooks (app_main.c) ---- */
 

@@ -82,6 +82,8 @@ static void set_value(app_registry_entry_s *e, const char *key, const char *valu
 		field = &e->icon;
 	else if (!strcmp(key, "operation"))
 		field = &e->operations;
+	else if (!strcmp(key, "mime"))
+		field = &e->mimes;
 	if (!field)
 		return;
 	free(*field);
@@ -125,6 +127,7 @@ void app_registry_entry_free(app_registry_entry_s *entry)
 	free(entry->label);
 	free(entry->icon);
 	free(entry->operations);
+	free(entry->mimes);
 	free(entry);
 }
 
@@ -205,20 +208,55 @@ void app_registry_foreach(bool (*cb)(const app_registry_entry_s *entry, void *da
 	registry_dirs_free(dirs);
 }
 
-bool app_registry_entry_handles(const app_registry_entry_s *entry, const char *operation)
+/* Calls match on each item of a comma-separated list until it answers true. */
+static bool list_any(const char *list, bool (*match)(const char *item, size_t n, const char *what), const char *what)
 {
-	if (!entry || !operation || !entry->operations)
-		return false;
-	size_t n = strlen(operation);
-	for (const char *p = entry->operations; *p;) {
+	for (const char *p = list; *p;) {
 		while (*p == ',' || *p == ' ')
 			p++;
 		const char *end = p + strcspn(p, ", ");
-		if ((size_t)(end - p) == n && !strncmp(p, operation, n))
+		if (end > p && match(p, (size_t)(end - p), what))
 			return true;
 		p = end;
 	}
 	return false;
+}
+
+static bool same_text(const char *item, size_t n, const char *what)
+{
+	return strlen(what) == n && !strncmp(item, what, n);
+}
+
+/* A wildcard subtype ("*" after the slash) takes every subtype of its type, on either side; a lone "*" takes all. */
+static bool mime_matches(const char *item, size_t n, const char *mime)
+{
+	if ((n == 1 && item[0] == '*') || (n == 3 && !strncmp(item, "*/*", 3)) || !strcmp(mime, "*/*"))
+		return true;
+	const char *slash = strchr(mime, '/');
+	const char *item_slash = memchr(item, '/', n);
+	if (!slash || !item_slash)
+		return same_text(item, n, mime);
+	size_t item_type = (size_t)(item_slash - item);
+	if ((size_t)(slash - mime) != item_type || strncmp(item, mime, item_type))
+		return false;
+	const char *sub = slash + 1;
+	size_t item_sub = n - item_type - 1;
+	return (item_sub == 1 && item_slash[1] == '*') || !strcmp(sub, "*") ||
+	       (strlen(sub) == item_sub && !strncmp(item_slash + 1, sub, item_sub));
+}
+
+bool app_registry_entry_handles(const app_registry_entry_s *entry, const char *operation)
+{
+	if (!entry || !operation || !entry->operations)
+		return false;
+	return list_any(entry->operations, same_text, operation);
+}
+
+bool app_registry_entry_takes(const app_registry_entry_s *entry, const char *operation, const char *mime)
+{
+	if (!app_registry_entry_handles(entry, operation))
+		return false;
+	return !mime || !*mime || !entry->mimes || list_any(entry->mimes, mime_matches, mime);
 }
 
 /* Where a spawned app's standard output and error go: <runtime dir>/tizen-apps/<id>.log */

@@ -8,50 +8,64 @@
 #include <stdio.h>
 #include <stdlib.h>
 #include <string.h>
+#include <sys/socket.h>
 #include <unistd.h>
 
-/* A received request whose sender waits for the reply on its connection. */
+/* A connection from another app; token is set while a request received on it waits for its reply. */
 typedef struct {
+	app_message_reader_s *reader;
+	Ecore_Fd_Handler *handler;
 	unsigned int token;
-	Ecore_Ipc_Client *client;
 	int ref;
-} waiting_sender_s;
+} client_s;
 
-static Ecore_Ipc_Server *server;
-static Eina_List *waiting_senders;
-static Ecore_Event_Handler *handlers[2];
+static int listen_fd = -1;
+static char *listen_id;
+static Ecore_Fd_Handler *accept_handler;
+static Eina_List *clients;
 static unsigned int last_token;
 
-static waiting_sender_s *waiting_find(unsigned int token)
+static client_s *waiting_find(unsigned int token)
 {
 	Eina_List *l;
-	waiting_sender_s *w;
-	EINA_LIST_FOREACH(waiting_senders, l, w)
-	if (w->token == token)
-		return w;
+	client_s *c;
+	EINA_LIST_FOREACH(clients, l, c)
+	if (c->token == token)
+		return c;
 	return NULL;
 }
 
-static void on_launch(Ecore_Ipc_Event_Client_Data *ev)
+static void client_forget(client_s *c)
 {
-	app_control_h request = ev->size > 0 ? app_control_decode_internal(ev->data, ev->size) : NULL;
+	clients = eina_list_remove(clients, c);
+	if (c->handler)
+		ecore_main_fd_handler_del(c->handler);
+	free(c);
+}
+
+static void client_close(client_s *c)
+{
+	app_message_reader_s *reader = c->reader;
+	/* The watch goes before the socket it watches is closed. */
+	client_forget(c);
+	app_message_reader_del(reader);
+}
+
+static void on_launch(client_s *c, const app_message_s *msg)
+{
+	app_control_h request = msg->size > 0 ? app_control_decode_internal(msg->data, msg->size) : NULL;
 	if (!request) {
 		LOGE("malformed launch request dropped");
+		client_close(c);
 		return;
 	}
 	request->reply_token = ++last_token;
-	request->reply_requested = ev->response == 1;
-	/* The sender waits for us to close a connection that needs no answer. */
-	if (!request->reply_requested)
-		ecore_ipc_client_del(ev->client);
+	request->reply_requested = msg->response == 1;
 	if (request->reply_requested) {
-		waiting_sender_s *w = calloc(1, sizeof(*w));
-		if (w) {
-			w->token = request->reply_token;
-			w->client = ev->client;
-			w->ref = ev->ref;
-			waiting_senders = eina_list_append(waiting_senders, w);
-		}
+		c->token = request->reply_token;
+		c->ref = msg->ref;
+	} else {
+		client_close(c);
 	}
 	LOGI("launch request from %s (%s)", request->caller ? request->caller : "?",
 	     request->operation ? request->operation : "no operation");
@@ -59,147 +73,113 @@ static void on_launch(Ecore_Ipc_Event_Client_Data *ev)
 	app_control_destroy(request);
 }
 
-static Eina_Bool client_data_cb(void *data, int type, void *event)
+static void client_message_cb(void *data, app_message_reader_s *reader, const app_message_s *msg)
 {
-	(void)data;
-	(void)type;
-	Ecore_Ipc_Event_Client_Data *ev = event;
-	if (!server || ecore_ipc_client_server_get(ev->client) != server)
-		return ECORE_CALLBACK_PASS_ON;
-	switch (ev->major) {
+	(void)reader;
+	client_s *c = data;
+	if (!msg) {
+		/* The sender is gone, or needs nothing more from this connection. */
+		client_forget(c);
+		return;
+	}
+	switch (msg->major) {
 	case APP_CHANNEL_MSG_LAUNCH:
-		on_launch(ev);
+		on_launch(c, msg);
 		break;
 	case APP_CHANNEL_MSG_TERMINATE:
-		ecore_ipc_client_del(ev->client);
+		client_close(c);
 		LOGI("asked to end");
 		ui_app_exit();
 		break;
 	case APP_CHANNEL_MSG_RESUME:
-		ecore_ipc_client_del(ev->client);
+		client_close(c);
 		app_main_raise();
 		break;
 	default:
-		LOGE("unknown message %d on the launch socket", ev->major);
+		LOGE("unknown message %d on the launch socket", msg->major);
 		break;
 	}
-	return ECORE_CALLBACK_DONE;
 }
 
-static Eina_Bool client_del_cb(void *data, int type, void *event)
+static Eina_Bool client_fd_cb(void *data, Ecore_Fd_Handler *handler);
+
+static void clients_accept(void)
+{
+	int fd;
+	while ((fd = accept4(listen_fd, NULL, NULL, SOCK_NONBLOCK | SOCK_CLOEXEC)) >= 0) {
+		client_s *c = calloc(1, sizeof(*c));
+		if (!c) {
+			close(fd);
+			continue;
+		}
+		c->reader = app_message_reader_add(fd, false, client_message_cb, c);
+		if (c->reader)
+			c->handler = ecore_main_fd_handler_add(fd, ECORE_FD_READ, client_fd_cb, NULL, NULL, NULL);
+		if (!c->handler) {
+			app_message_reader_del(c->reader);
+			free(c);
+			continue;
+		}
+		clients = eina_list_append(clients, c);
+	}
+}
+
+/* Takes the messages of all connections in the order they were made: the main loop reports ready
+   sockets in no set order, and an app that sends two messages one after the other expects them handled
+   in that order (a request, then a terminate). */
+static void clients_read(void)
+{
+	clients_accept();
+	Eina_List *order = eina_list_clone(clients);
+	client_s *c;
+	EINA_LIST_FREE(order, c)
+	{
+		if (listen_fd >= 0 && eina_list_data_find(clients, c))
+			app_message_reader_read(c->reader);
+	}
+}
+
+static Eina_Bool client_fd_cb(void *data, Ecore_Fd_Handler *handler)
 {
 	(void)data;
-	(void)type;
-	Ecore_Ipc_Event_Client_Del *ev = event;
-	if (!server || ecore_ipc_client_server_get(ev->client) != server)
-		return ECORE_CALLBACK_PASS_ON;
-	Eina_List *l, *next;
-	waiting_sender_s *w;
-	EINA_LIST_FOREACH_SAFE(waiting_senders, l, next, w)
-	{
-		if (w->client != ev->client)
-			continue;
-		free(w);
-		waiting_senders = eina_list_remove_list(waiting_senders, l);
-	}
-	ecore_ipc_client_del(ev->client);
-	return ECORE_CALLBACK_DONE;
-}
-
-/* Ecore_Con complains loudly that local sockets cannot reuse ports; that is expected here. */
-static Ecore_Ipc_Server *server_add_quiet(const char *name)
-{
-	int level = eina_log_domain_level_get("ecore_con");
-	eina_log_domain_level_set("ecore_con", EINA_LOG_LEVEL_CRITICAL);
-	Ecore_Ipc_Server *s = ecore_ipc_server_add(ECORE_IPC_LOCAL_USER, name, 0, NULL);
-	eina_log_domain_level_set("ecore_con", level);
-	return s;
-}
-
-/* <runtime dir>/<id>.pid (malloc'ed) */
-static char *pid_file_path(const char *app_id)
-{
-	char *dir = app_paths_runtime_dir_get();
-	char *path = NULL;
-	if (dir && asprintf(&path, "%s/%s.pid", dir, app_id) < 0)
-		path = NULL;
-	free(dir);
-	return path;
-}
-
-static char *pid_file;
-
-static void pid_file_write(const char *app_id)
-{
-	pid_file = pid_file_path(app_id);
-	FILE *f = pid_file ? fopen(pid_file, "w") : NULL;
-	if (!f)
-		return;
-	fprintf(f, "%d\n", (int)getpid());
-	fclose(f);
-}
-
-pid_t app_server_pid_get(const char *app_id)
-{
-	char *path = pid_file_path(app_id);
-	FILE *f = path ? fopen(path, "r") : NULL;
-	free(path);
-	int pid = -1;
-	if (f) {
-		if (fscanf(f, "%d", &pid) != 1)
-			pid = -1;
-		fclose(f);
-	}
-	return (pid_t)pid;
+	(void)handler;
+	clients_read();
+	return ECORE_CALLBACK_RENEW;
 }
 
 bool app_server_start(const char *app_id)
 {
-	if (server)
+	if (listen_fd >= 0)
 		return true;
-	ecore_ipc_init();
-	char *name = app_channel_name_get(app_id);
-	if (name)
-		app_channel_stale_remove(name);
-	server = name ? server_add_quiet(name) : NULL;
-	free(name);
-	if (!server) {
-		ecore_ipc_shutdown();
+	listen_fd = app_channel_listen(app_id);
+	if (listen_fd < 0)
 		return false;
-	}
-	handlers[0] = ecore_event_handler_add(ECORE_IPC_EVENT_CLIENT_DATA, client_data_cb, NULL);
-	handlers[1] = ecore_event_handler_add(ECORE_IPC_EVENT_CLIENT_DEL, client_del_cb, NULL);
-	pid_file_write(app_id);
+	accept_handler = ecore_main_fd_handler_add(listen_fd, ECORE_FD_READ, client_fd_cb, NULL, NULL, NULL);
+	listen_id = strdup(app_id);
 	LOGI("taking launch requests for %s", app_id);
 	return true;
 }
 
 void app_server_stop(void)
 {
-	if (!server)
+	if (listen_fd < 0)
 		return;
-	for (int i = 0; i < 2; i++) {
-		ecore_event_handler_del(handlers[i]);
-		handlers[i] = NULL;
-	}
-	waiting_sender_s *w;
-	EINA_LIST_FREE(waiting_senders, w)
-	free(w);
-	/* Closing drops the open connections: senders still waiting see their request canceled. */
-	ecore_ipc_server_del(server);
-	server = NULL;
-	if (pid_file) {
-		unlink(pid_file);
-		free(pid_file);
-		pid_file = NULL;
-	}
-	ecore_ipc_shutdown();
+	if (accept_handler)
+		ecore_main_fd_handler_del(accept_handler);
+	accept_handler = NULL;
+	/* Senders still waiting for a reply see their request canceled. */
+	while (clients)
+		client_close(eina_list_data_get(clients));
+	app_channel_unlisten(listen_id, listen_fd);
+	listen_fd = -1;
+	free(listen_id);
+	listen_id = NULL;
 }
 
 int app_server_reply(unsigned int reply_token, app_control_h reply, app_control_result_e result)
 {
-	waiting_sender_s *w = waiting_find(reply_token);
-	if (!w) {
+	client_s *c = waiting_find(reply_token);
+	if (!c) {
 		LOGE("the request was answered already or its sender is gone");
 		return APP_CONTROL_ERROR_INVALID_PARAMETER;
 	}
@@ -209,16 +189,14 @@ int app_server_reply(unsigned int reply_token, app_control_h reply, app_control_
 		LOGE("cannot encode the reply");
 		return APP_CONTROL_ERROR_OUT_OF_MEMORY;
 	}
-	int sent = ecore_ipc_client_send(w->client, APP_CHANNEL_MSG_REPLY, 0, 0, w->ref, (int)result, raw, len);
-	ecore_ipc_client_flush(w->client);
+	app_message_s msg = {APP_CHANNEL_MSG_REPLY, c->ref, (int)result, len, raw};
+	int ret = app_message_send(app_message_reader_fd_get(c->reader), &msg, APP_MESSAGE_SEND_TIMEOUT_SEC);
 	free(raw);
-	waiting_senders = eina_list_remove(waiting_senders, w);
-	free(w);
-	if (sent <= 0) {
+	/* One answer per request: the sender reads it after the close as well. */
+	client_close(c);
+	if (ret != APP_CONTROL_ERROR_NONE)
 		LOGE("cannot send the reply");
-		return APP_CONTROL_ERROR_IO_ERROR;
-	}
-	return APP_CONTROL_ERROR_NONE;
+	return ret;
 }
 
 int app_control_reply_to_launch_request(app_control_h reply, app_control_h request, app_control_result_e result)

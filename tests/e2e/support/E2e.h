@@ -7,13 +7,6 @@
 
 namespace memo_test
 {
-// The class name of the page a plain start shows.
-#if __has_include("View/MemoListView.h")
-const char *const LIST_PAGE = "MemoListView";
-#else
-const char *const LIST_PAGE = "MemoEditView"; // a new memo stands in for the list until it lands
-#endif
-
 // The memo app driven as other programs drive it: launch requests through app_launcher, its data under a
 // private folder, what it did read from its log and its memo.db. `env` goes in front of every command; an
 // empty `root` makes a private one. The app is ended with the object.

@@ -2,8 +2,8 @@
 #include "UiTestSupport.h"
 
 #include <Ecore_Evas.h>
-#include <desktop/toast_log.h>
 
+#include <cmath>
 #include <cstdint>
 
 #include "TestEnv.h"
@@ -14,21 +14,23 @@ namespace memo_ui_test
 
 void initUi()
 {
-	static bool ready = false;
-	if (ready)
-		return;
-	static char arg0[] = "memo-ui-test";
-	static char *argv[] = {arg0, nullptr};
-	elm_init(1, argv);
-	elm_theme_extension_add(nullptr, MemoUtil::getEdjePath());
-	// Long presses in tests should not take a second each.
-	elm_config_longpress_timeout_set(0.3);
-	ready = true;
+	static const bool ready = [] {
+		static char arg0[] = "memo-ui-test";
+		static char *argv[] = {arg0, nullptr};
+		elm_init(1, argv);
+		elm_theme_extension_add(nullptr, MemoUtil::getEdjePath());
+		// Long presses in tests should not take a second each.
+		elm_config_longpress_timeout_set(0.3);
+		return true;
+	}();
+	(void)ready;
 }
 
 void UiFixture::SetUp()
 {
 	initUi();
+	// As the app sets it: layout sizes are given for a scale of 2.6.
+	elm_app_base_scale_set(2.6);
 	win = elm_win_add(nullptr, "memo-ui-test", ELM_WIN_BASIC);
 	ASSERT_NE(win, nullptr);
 	elm_win_autodel_set(win, EINA_FALSE);
@@ -45,12 +47,6 @@ void UiFixture::SetUp()
 	elm_win_resize_object_add(win, scroller);
 	evas_object_show(scroller);
 
-	box = elm_box_add(scroller);
-	evas_object_size_hint_weight_set(box, EVAS_HINT_EXPAND, 0.0);
-	evas_object_size_hint_align_set(box, EVAS_HINT_FILL, 0.0);
-	elm_object_content_set(scroller, box);
-	evas_object_show(box);
-
 	evas_object_resize(win, 720, 1280);
 	evas_object_show(win);
 	elm_win_activate(win);
@@ -58,7 +54,7 @@ void UiFixture::SetUp()
 	if (ee)
 		ecore_evas_focus_set(ee, EINA_TRUE);
 	evas_focus_in(evas());
-	clearToasts();
+	desktop_toast_log_clear();
 	render();
 }
 
@@ -66,8 +62,9 @@ void UiFixture::TearDown()
 {
 	if (win)
 		evas_object_del(win);
-	win = scroller = box = nullptr;
+	win = scroller = nullptr;
 	runFor(0.02);
+	elm_config_scale_set(1.0);
 }
 
 Evas *UiFixture::evas() const
@@ -132,17 +129,11 @@ void UiFixture::pressKey(const char *keyName, const char *string)
 
 void UiFixture::typeText(const char *text)
 {
-	for (const char *p = text; p && *p; p++) {
-		char typed[2] = {*p, '\0'};
-		std::string keyName = typed;
-		if (*p == ' ')
-			keyName = "space";
-		else if (*p == '.')
-			keyName = "period";
-		else if (*p == ',')
-			keyName = "comma";
-		evas_event_feed_key_down(evas(), keyName.c_str(), keyName.c_str(), typed, typed, ++__timestamp, nullptr);
-		evas_event_feed_key_up(evas(), keyName.c_str(), keyName.c_str(), typed, typed, ++__timestamp, nullptr);
+	for (const char *p = text; *p; p++) {
+		const char typed[2] = {*p, '\0'};
+		const char *key = *p == ' ' ? "space" : *p == '.' ? "period" : *p == ',' ? "comma" : typed;
+		evas_event_feed_key_down(evas(), key, key, typed, typed, ++__timestamp, nullptr);
+		evas_event_feed_key_up(evas(), key, key, typed, typed, ++__timestamp, nullptr);
 	}
 	runFor(0.03);
 }
@@ -173,6 +164,13 @@ void UiFixture::tap(int x, int y)
 	mouseUp(x, y);
 }
 
+void UiFixture::tapOn(Evas_Object *obj)
+{
+	int x = 0, y = 0;
+	centreOf(obj, &x, &y);
+	tap(x, y);
+}
+
 void UiFixture::centreOf(Evas_Object *obj, int *x, int *y)
 {
 	render();
@@ -189,54 +187,26 @@ void UiFixture::focus(Evas_Object *widget)
 	runFor(0.02);
 }
 
-bool UiFixture::screenshot(const std::string &pngPath)
-{
-	render();
-	return memo_test::saveScreenshot(win, pngPath);
-}
-
-bool writePicture(const std::string &path, int w, int h)
+bool writePicture(const std::string &path, int w, int h, uint32_t sky, uint32_t hill)
 {
 	Ecore_Evas *ee = ecore_evas_buffer_new(1, 1);
-	if (!ee)
+	Evas_Object *img = ee ? evas_object_image_add(ecore_evas_get(ee)) : nullptr;
+	if (!img)
 		return false;
-	Evas_Object *img = evas_object_image_add(ecore_evas_get(ee));
 	evas_object_image_size_set(img, w, h);
 	uint32_t *px = static_cast<uint32_t *>(evas_object_image_data_get(img, EINA_TRUE));
-	if (!px) {
-		ecore_evas_free(ee);
-		return false;
-	}
 	const int stride = evas_object_image_stride_get(img) / 4;
 	for (int y = 0; y < h; y++) {
 		for (int x = 0; x < w; x++) {
-			const bool frame = x < 4 || y < 4 || x >= w - 4 || y >= h - 4;
-			const uint32_t r = frame ? 60 : 120 + 100 * x / w;
-			const uint32_t g = frame ? 60 : 170 + 60 * y / h;
-			const uint32_t b = frame ? 60 : 220 - 60 * x / w;
-			px[y * stride + x] = 0xff000000u | (r << 16) | (g << 8) | b;
+			const bool ground = y > h * (0.62 + 0.08 * std::sin(x * 5.0 / w));
+			const uint32_t shade = ground ? 0 : static_cast<uint32_t>(50 * y / h) * 0x010100;
+			px[y * stride + x] = 0xff000000u | ((ground ? hill : sky) + shade);
 		}
 	}
 	evas_object_image_data_set(img, px);
-	const Eina_Bool ok = evas_object_image_save(img, path.c_str(), nullptr, "quality=90 compress=1");
+	const Eina_Bool ok = evas_object_image_save(img, path.c_str(), nullptr, "quality=92 compress=1");
 	ecore_evas_free(ee);
 	return ok;
-}
-
-int toastCount()
-{
-	return desktop_toast_log_count();
-}
-
-std::string toastAt(int index)
-{
-	const char *text = desktop_toast_log_get(index);
-	return text ? text : "";
-}
-
-void clearToasts()
-{
-	desktop_toast_log_clear();
 }
 
 } // namespace memo_ui_test

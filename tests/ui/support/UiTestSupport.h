@@ -2,12 +2,15 @@
 #define TESTS_UI_SUPPORT_UITESTSUPPORT_H
 
 // Scaffolding of the in-process UI tests: Elementary on the buffer engine with the app's theme, a
-// window holding a scroller and a vertical box, and real key and pointer events fed to its canvas.
+// window holding a scroller, and real key and pointer events fed to its canvas.
 
+#include <cstdint>
 #include <functional>
 #include <string>
 
 #include <Elementary.h>
+// The toasts posted: desktop_toast_log_count(), _get(index) and _clear().
+#include <desktop/toast_log.h>
 #include <gtest/gtest.h>
 
 namespace memo_ui_test
@@ -16,7 +19,8 @@ namespace memo_ui_test
 // Elementary and the app's theme, once per process. Safe to call again.
 void initUi();
 
-// A window of 720 x 1280 with a background, a scroller and a vertical box (`box`) in it.
+// A window of 720 x 1280 with a background and a scroller, at the app's scale; tests may change the
+// scale.
 class UiFixture : public ::testing::Test
 {
 protected:
@@ -35,40 +39,33 @@ protected:
 
 	// One key press and release (`string` is what the key types, null for none), then the handlers run.
 	void pressKey(const char *keyName, const char *string = nullptr);
-	// Types UTF-8 text one character per key press (ASCII letters, digits, blanks and punctuation).
+	// Types ASCII text, one key press per character.
 	void typeText(const char *text);
 
 	// Pointer events at canvas coordinates; each lets the handlers run.
 	void mouseDown(int x, int y);
 	void mouseMove(int x, int y);
 	void mouseUp(int x, int y);
-	// Down and up at one point.
+	// Down and up at one point, or at the centre of an object.
 	void tap(int x, int y);
+	void tapOn(Evas_Object *obj);
 	// The centre of an object's geometry, after a render.
 	void centreOf(Evas_Object *obj, int *x, int *y);
 
 	// Focuses the widget and gives the canvas the keyboard.
 	void focus(Evas_Object *widget);
 
-	// Saves the window as PNG.
-	bool screenshot(const std::string &pngPath);
-
 	Evas_Object *win = nullptr;
 	Evas_Object *scroller = nullptr;
-	Evas_Object *box = nullptr;
 
 private:
 	unsigned int __timestamp = 1000;
 };
 
-// Writes a picture of w x h to `path` in the format of its extension (.jpg, .png), a soft gradient with
-// a dark frame, through a throw-away buffer canvas. False when Evas cannot save it.
-bool writePicture(const std::string &path, int w, int h);
-
-// The messages posted as toasts since the last clearToasts().
-int toastCount();
-std::string toastAt(int index);
-void clearToasts();
+// Writes a picture of w x h to `path` in the format of its extension (.jpg, .png) through a throw-away
+// buffer canvas: a small landscape, sky over a hill, so that screenshots show a picture and not a test
+// card. False when Evas cannot save it.
+bool writePicture(const std::string &path, int w, int h, uint32_t sky = 0x7fb6e0, uint32_t hill = 0x3f7a4a);
 
 } // namespace memo_ui_test
 

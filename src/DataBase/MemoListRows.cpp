@@ -1,0 +1,76 @@
+#include "MemoListRows.h"
+
+#include <cstring>
+
+#include <Ecore.h>
+
+namespace
+{
+// What the rows were read at: the statement, the database's version as other connections left it, and the
+// changes this connection has made.
+struct Kept {
+	std::string sql;
+	long long dataVersion = -1;
+	long long ownChanges = -1;
+	std::shared_ptr<const MemoListRows> rows;
+	Ecore_Idle_Enterer *dropper = nullptr;
+};
+
+Kept gKept;
+
+long long __dataVersion(sqlite3 *db)
+{
+	sqlite3_stmt *stmt = nullptr;
+	long long version = -1;
+	if (sqlite3_prepare_v2(db, "PRAGMA data_version", -1, &stmt, nullptr) == SQLITE_OK &&
+	    sqlite3_step(stmt) == SQLITE_ROW)
+		version = sqlite3_column_int64(stmt, 0);
+	sqlite3_finalize(stmt);
+	return version;
+}
+
+Eina_Bool __dropCb(void *)
+{
+	gKept.dropper = nullptr;
+	MemoListRows::forget();
+	return ECORE_CALLBACK_CANCEL;
+}
+} // namespace
+
+MemoListRows::MemoListRows(MemoSqlStmt &stmt, int columns) : __columns(columns)
+{
+	while (stmt.step() == SQLITE_ROW) {
+		for (int c = 0; c < columns; ++c) {
+			const char *text = stmt.text(c);
+			__rows.push_back({text == nullptr, static_cast<long long>(stmt.u64(c)), text ? text : ""});
+		}
+	}
+}
+
+std::shared_ptr<const MemoListRows> MemoListRows::find(sqlite3 *db, const char *sql)
+{
+	if (!gKept.rows || gKept.sql != sql)
+		return nullptr;
+	if (gKept.ownChanges != sqlite3_total_changes64(db) || gKept.dataVersion != __dataVersion(db)) {
+		forget();
+		return nullptr;
+	}
+	return gKept.rows;
+}
+
+void MemoListRows::keep(sqlite3 *db, const char *sql, std::shared_ptr<const MemoListRows> rows)
+{
+	gKept.sql = sql;
+	gKept.dataVersion = __dataVersion(db);
+	gKept.ownChanges = sqlite3_total_changes64(db);
+	gKept.rows = std::move(rows);
+	// The rows serve one step of the program; an idle main loop has finished it.
+	if (!gKept.dropper)
+		gKept.dropper = ecore_idle_enterer_add(__dropCb, nullptr);
+}
+
+void MemoListRows::forget()
+{
+	gKept.rows.reset();
+	gKept.sql.clear();
+}

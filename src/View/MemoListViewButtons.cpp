@@ -1,0 +1,160 @@
+// The list's ways on: the floating button for a new memo (or the storage-full popup), and the more menu.
+#include "View/MemoListView.h"
+
+#include <cstdlib>
+
+#include <app_i18n.h>
+#include <eext_floatingbutton.h>
+#include <notification_status.h>
+
+#include <WMenuPopupController.h>
+#include <WNaviframeController.h>
+#include <WPopupController.h>
+#include <WWindowController.h>
+
+#include "DataBase/MemoDbMgr.h"
+#include "MemoLog.h"
+#include "Model/MemoPopupMonitor.h"
+#include "Util/MemoUtil.h"
+
+using app_assist::WMenuPopupController;
+using app_assist::WPopupController;
+using app_assist::WWindowController;
+
+namespace
+{
+const char FLOATING_BUTTON_PART[] = "elm.swallow.floatingbutton";
+
+Evas_Object *__baseLayoutOf(WWindowController *window)
+{
+	return window ? window->getBaseLayoutEvasObj() : nullptr;
+}
+} // namespace
+
+void MemoListView::__showFloatingButton()
+{
+	Evas_Object *baseLayout = __baseLayoutOf(getWindowController());
+	if (!baseLayout) {
+		MEMO_LOGE("no base layout for the floating button");
+		return;
+	}
+	if (!__floatingBtn) {
+		__floatingBtn = eext_floatingbutton_add(baseLayout);
+		if (!__floatingBtn)
+			return;
+		eext_floatingbutton_mode_set(__floatingBtn, EEXT_FLOATINGBUTTON_MODE_BOTH_SIDES);
+		elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
+		Evas_Object *button = elm_button_add(__floatingBtn);
+		elm_object_style_set(button, "memo_floating");
+		elm_object_part_content_set(__floatingBtn, "button1", button);
+		Evas_Object *icon = elm_image_add(button);
+		char *path = MemoUtil::getImageResourcePathN("core_floating_button_icon.png");
+		if (path)
+			elm_image_file_set(icon, path, nullptr);
+		free(path);
+		elm_object_part_content_set(button, "icon", icon);
+		evas_object_smart_callback_add(button, "clicked", __newMemoBtnCb, this);
+	} else {
+		elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
+	}
+	evas_object_show(__floatingBtn);
+}
+
+void MemoListView::__hideFloatingButton()
+{
+	Evas_Object *baseLayout = __baseLayoutOf(getWindowController());
+	if (!baseLayout)
+		return;
+	Evas_Object *button = elm_object_part_content_unset(baseLayout, FLOATING_BUTTON_PART);
+	if (button)
+		evas_object_hide(button);
+}
+
+void MemoListView::__newMemoBtnCb(void *data, Evas_Object *obj, void *eventInfo)
+{
+	(void)obj;
+	(void)eventInfo;
+	MemoListView *self = static_cast<MemoListView *>(data);
+	if (!self || !self->__isTop()) {
+		MEMO_LOGE("self is NULL or Top is not Me");
+		return;
+	}
+	// Storage is checked when a memo is started, not when one is opened.
+	if (MemoUtil::getMemorySpaceStatusGet()) {
+		self->__hideFloatingButton();
+		self->__isTopView = false;
+		self->__pushEditView(nullptr);
+	} else {
+		self->__createStorageFullPopup();
+	}
+}
+
+void MemoListView::__createStorageFullPopup()
+{
+	if (MemoUtil::isPowerSavingMode()) {
+		notification_status_message_post(i18n_get_text("IDS_ST_TPOP_NOT_ENOUGH_SPACE_IN_PHONE_STORAGE"));
+		return;
+	}
+	WPopupController *popup = new WPopupController();
+	popup->setTextTranslatable("memo");
+	popup->setTitle("IDS_IDLE_HEADER_NOT_ENOUGH_SPACE_ABB2");
+	popup->setContent("IDS_IDLE_POP_YOUR_DEVICE_STORAGE_DOESNT_HAVE_ENOUGH_SPACE_GO_TO_SETTINGS_STORAGE_AND_RAM_"
+	                  "STORAGE_DETAILS_THEN_DELETE_SOME_FILES_AND_TRY_AGAIN");
+	popup->addButton("IDS_MEMO_BUTTON_CANCEL", [](bool *close) { *close = true; });
+	popup->addButton("IDS_MEMO_OPT_SETTINGS", [this](bool *close) {
+		*close = true;
+		__launchStorageSettings();
+	});
+	if (attachPopup(popup))
+		MemoPopupMonitor::getInstance()->addPopup(popup);
+}
+
+// Storage settings at their details page; each failed step is logged and the next one tried.
+void MemoListView::__launchStorageSettings()
+{
+	app_control_h request = nullptr;
+	if (app_control_create(&request) != APP_CONTROL_ERROR_NONE)
+		MEMO_LOGE("Error app_control_create()");
+	if (app_control_set_launch_mode(request, APP_CONTROL_LAUNCH_MODE_GROUP) != APP_CONTROL_ERROR_NONE)
+		MEMO_LOGE("Error app_control_set_launch_mode()");
+	if (app_control_set_app_id(request, "com.veltron.setting.storage") != APP_CONTROL_ERROR_NONE)
+		MEMO_LOGE("Error app_control_set_app_id()");
+	if (app_control_add_extra_data(request, "viewtype", "storage_detail") != APP_CONTROL_ERROR_NONE)
+		MEMO_LOGE("Error app_control_add_extra_data()");
+	if (app_control_send_launch_request(request, nullptr, nullptr) != APP_CONTROL_ERROR_NONE)
+		MEMO_LOGE("Error app_control_send_launch_request()");
+	app_control_destroy(request);
+}
+
+void MemoListView::__moreBtnSelectCb(void *data, Evas_Object *obj, void *eventInfo)
+{
+	(void)obj;
+	(void)eventInfo;
+	MemoListView *self = static_cast<MemoListView *>(data);
+	if (!self || !self->__isTop()) {
+		MEMO_LOGE("self is NULL or Top is not Me");
+		return;
+	}
+	MemoDbMgr *db = MemoDbMgr::getInstance();
+	const int memoCount = db->getMemoCount();
+	if (memoCount < 1) {
+		MEMO_LOGI("There is no memo. More button skipped.");
+		return;
+	}
+	if (MemoPopupMonitor::getInstance()->isPopupAlive())
+		return;
+	WWindowController *window = self->getWindowController();
+	WMenuPopupController *menu = new WMenuPopupController();
+	if (!window || !menu->createMenu(window->getEvasObj(), self->getNaviframeController()->getEvasObj())) {
+		menu->destroy();
+		return;
+	}
+	if (self->__isPickMode) {
+		menu->appendItem(i18n_get_text("IDS_MEMO_OPT_SEARCH"), [self] { self->__pushSearchView(true); });
+	} else if (memoCount - db->getHiddenMemoCount() > 0) {
+		menu->appendItem(i18n_get_text("IDS_MEMO_BUTTON_DELETE"), [self] { self->__pushSelectionView(); });
+		menu->appendItem(i18n_get_text("IDS_MEMO_OPT_SEARCH"), [self] { self->__pushSearchView(false); });
+	}
+	menu->showMenu();
+	self->attachPopup(menu);
+}

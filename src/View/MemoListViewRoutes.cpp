@@ -1,0 +1,64 @@
+// The list's ways to the search, the selection and the hidden memos, and the account settings that the
+// hidden memos need; the views behind them come with their own work.
+#include "View/MemoListView.h"
+
+#include <app_control.h>
+
+#include "DataBase/MemoDbMgr.h"
+#include "MemoLog.h"
+#include "Util/MemoUtil.h"
+
+namespace
+{
+const int HIDDEN_GESTURE_LIMIT = 76;
+const int HIDDEN_PASSWORD_SIZE = 256;
+} // namespace
+
+void MemoListView::__pushSearchView(bool servePick)
+{
+	MEMO_LOGI("Search chosen%s: no search view yet", servePick ? " to pick" : "");
+}
+
+void MemoListView::__pushSelectionView()
+{
+	MEMO_LOGI("Delete chosen: no selection view yet");
+}
+
+void MemoListView::__pushHiddenView(bool hasPassword)
+{
+	MEMO_LOGI("hidden memos asked for (%s): no hidden memo view yet", hasPassword ? "PIN set" : "first access");
+}
+
+bool MemoListView::__openHiddenMemos(void *event)
+{
+	const int *values = static_cast<const int *>(event);
+	if (!values || values[1] >= HIDDEN_GESTURE_LIMIT || !__isTopView)
+		return true;
+	__hideFloatingButton();
+	__isTopView = false;
+	char password[HIDDEN_PASSWORD_SIZE] = {};
+	__pushHiddenView(MemoDbMgr::getInstance()->getHiddenMemoPassword(password));
+	return true;
+}
+
+void MemoListView::__launchAccountSettings()
+{
+	app_control_h request = nullptr;
+	if (app_control_create(&request) != APP_CONTROL_ERROR_NONE) {
+		MEMO_LOGE("Error app_control_create()");
+		return;
+	}
+	if (MemoUtil::checkVeltronAccountLogIn()) {
+		app_control_set_operation(request, "http://tizen.org/appcontrol/operation/account/configure");
+		app_control_set_app_id(request, "com.veltron.veltron-account-front");
+	} else {
+		app_control_add_extra_data(request, "mode", "account_list");
+		app_control_add_extra_data(request, "capability_filter", "http://tizen.org/account/capability/memo");
+		app_control_set_operation(request, APP_CONTROL_OPERATION_PICK);
+		app_control_set_app_id(request, "setting-myaccount-efl");
+		app_control_set_launch_mode(request, APP_CONTROL_LAUNCH_MODE_GROUP);
+	}
+	if (app_control_send_launch_request(request, nullptr, nullptr) != APP_CONTROL_ERROR_NONE)
+		MEMO_LOGE("Error app_control_send_launch_request()");
+	app_control_destroy(request);
+}
