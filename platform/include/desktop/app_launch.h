@@ -7,10 +7,10 @@
 extern "C" {
 #endif
 
-/* Messages that need no answer (requests sent without a reply callback, terminate) are handed over
-   on the main loop. Runs the loop until every such message of this process has been taken by its
-   receiver, or the time is up: APP_CONTROL_ERROR_NONE or APP_CONTROL_ERROR_TIMED_OUT. Call it before
-   a process that sent requests ends. */
+/* Messages that need no answer (requests sent without a reply callback, terminate, message port
+   messages) are handed over on the main loop. Runs the loop until every such message of this process
+   has been taken by its receiver, or the time is up: APP_CONTROL_ERROR_NONE or
+   APP_CONTROL_ERROR_TIMED_OUT. Call it before a process that sent requests ends. */
 int desktop_app_launch_drain(double timeout_sec);
 
 #ifdef __cplusplus

@@ -40,21 +40,19 @@ static uint64_t fnv1a(const char *s)
 	return h;
 }
 
-char *app_channel_name_get(const char *app_id)
+/* "<prefix><key>"; socket paths are short (108 bytes): a long key is cut and made unique by its hash. */
+static char *socket_name_get(const char *prefix, const char *key)
 {
-	if (!app_id)
-		return NULL;
 	char *name = NULL;
-	if (asprintf(&name, "tizen-app-%s", app_id) < 0)
+	if (asprintf(&name, "%s%s", prefix, key) < 0)
 		return NULL;
-	/* Socket paths are short (108 bytes): a long id is cut and made unique by its hash. */
 	char path[sizeof(((struct sockaddr_un *)0)->sun_path)];
 	if (socket_path_get(name, path, sizeof(path)) < 0) {
 		free(name);
-		if (asprintf(&name, "tizen-app-%.16s-%016" PRIx64, app_id, fnv1a(app_id)) < 0)
+		if (asprintf(&name, "%s%.16s-%016" PRIx64, prefix, key, fnv1a(key)) < 0)
 			return NULL;
 		if (socket_path_get(name, path, sizeof(path)) < 0) {
-			LOGE("the runtime folder is too deep for a socket of %s", app_id);
+			LOGE("the runtime folder is too deep for a socket of %s", key);
 			free(name);
 			return NULL;
 		}
@@ -62,10 +60,25 @@ char *app_channel_name_get(const char *app_id)
 	return name;
 }
 
+char *app_channel_name_get(const char *app_id)
+{
+	return app_id ? socket_name_get("tizen-app-", app_id) : NULL;
+}
+
+char *app_channel_port_name_get(const char *app_id, const char *port)
+{
+	char *key = NULL;
+	if (!app_id || !port || asprintf(&key, "%s-%s", app_id, port) < 0)
+		return NULL;
+	char *name = socket_name_get("tizen-mp-", key);
+	free(key);
+	return name;
+}
+
 /* True when something accepts connections on the socket: Ecore_Ipc reports a stale socket (its
    owner died) only later on the main loop, so liveness is checked with a plain connect first.
    The path is the one Ecore_Con gives user-local sockets. */
-static bool socket_accepts(const char *name)
+bool app_channel_socket_accepts(const char *name)
 {
 	char path[sizeof(((struct sockaddr_un *)0)->sun_path)];
 	int n = socket_path_get(name, path, sizeof(path));
@@ -83,23 +96,38 @@ static bool socket_accepts(const char *name)
 	return ok;
 }
 
-Ecore_Ipc_Server *app_channel_connect(const char *app_id)
+Ecore_Ipc_Server *app_channel_socket_connect(const char *name)
 {
 	channel_init();
-	char *name = app_channel_name_get(app_id);
-	if (!name)
+	if (!name || !app_channel_socket_accepts(name))
 		return NULL;
-	Ecore_Ipc_Server *server = NULL;
-	if (socket_accepts(name))
-		server = ecore_ipc_server_connect(ECORE_IPC_LOCAL_USER, name, 0, NULL);
+	return ecore_ipc_server_connect(ECORE_IPC_LOCAL_USER, (char *)name, 0, NULL); /* the name is only read */
+}
+
+Ecore_Ipc_Server *app_channel_connect(const char *app_id)
+{
+	char *name = app_channel_name_get(app_id);
+	Ecore_Ipc_Server *server = app_channel_socket_connect(name);
 	free(name);
 	return server;
+}
+
+Ecore_Ipc_Server *app_channel_server_add(const char *name)
+{
+	channel_init();
+	app_channel_stale_remove(name);
+	/* Ecore_Con complains loudly that local sockets cannot reuse ports; that is expected here. */
+	int level = eina_log_domain_level_get("ecore_con");
+	eina_log_domain_level_set("ecore_con", EINA_LOG_LEVEL_CRITICAL);
+	Ecore_Ipc_Server *s = ecore_ipc_server_add(ECORE_IPC_LOCAL_USER, name, 0, NULL);
+	eina_log_domain_level_set("ecore_con", level);
+	return s;
 }
 
 void app_channel_stale_remove(const char *name)
 {
 	char path[sizeof(((struct sockaddr_un *)0)->sun_path)];
-	if (socket_path_get(name, path, sizeof(path)) < 0 || access(path, F_OK) != 0 || socket_accepts(name))
+	if (socket_path_get(name, path, sizeof(path)) < 0 || access(path, F_OK) != 0 || app_channel_socket_accepts(name))
 		return;
 	/* Left by an instance that died: a new server could not listen while it is there. */
 	if (unlink(path) == 0)
@@ -110,7 +138,7 @@ bool app_channel_is_running(const char *app_id)
 {
 	channel_init();
 	char *name = app_channel_name_get(app_id);
-	bool running = name && socket_accepts(name);
+	bool running = name && app_channel_socket_accepts(name);
 	free(name);
 	return running;
 }

@@ -192,8 +192,7 @@ static void handlers_install(void)
 	del_handler = ecore_event_handler_add(ECORE_IPC_EVENT_SERVER_DEL, server_del_cb, NULL);
 }
 
-/* Sends one message and leaves the connection to the receiver to close; false if it could not be sent. */
-static bool send_and_release(Ecore_Ipc_Server *server, int major, int ref, const void *data, int size)
+bool app_launch_send_and_release(Ecore_Ipc_Server *server, int major, int ref, const void *data, int size)
 {
 	int sent = ecore_ipc_server_send(server, major, 0, ref, 0, 0, data, size);
 	if (sent <= 0) {
@@ -306,7 +305,7 @@ int app_control_send_launch_request(app_control_h app_control, app_control_reply
 	}
 	int ref = ++last_ref;
 	if (ret == APP_CONTROL_ERROR_NONE && !callback) {
-		if (!send_and_release(server, APP_CHANNEL_MSG_LAUNCH, ref, raw, len))
+		if (!app_launch_send_and_release(server, APP_CHANNEL_MSG_LAUNCH, ref, raw, len))
 			ret = launch_error(APP_CONTROL_ERROR_IO_ERROR, "cannot send the request", app_id);
 		server = NULL;
 	} else if (ret == APP_CONTROL_ERROR_NONE) {
@@ -345,7 +344,7 @@ static int send_simple(const char *app_id, int major)
 	Ecore_Ipc_Server *server = app_channel_connect(app_id);
 	if (!server)
 		return APP_CONTROL_ERROR_APP_NOT_FOUND;
-	return send_and_release(server, major, 0, NULL, 0) ? APP_CONTROL_ERROR_NONE : APP_CONTROL_ERROR_IO_ERROR;
+	return app_launch_send_and_release(server, major, 0, NULL, 0) ? APP_CONTROL_ERROR_NONE : APP_CONTROL_ERROR_IO_ERROR;
 }
 
 int app_control_send_terminate_request(app_control_h app_control)
@@ -376,7 +375,7 @@ int app_launch_forward(app_control_h request, const char *app_id)
 	if (!app_control_encode_internal(request, caller, false, &raw, &len)) {
 		ecore_ipc_server_del(server);
 		ret = APP_CONTROL_ERROR_OUT_OF_MEMORY;
-	} else if (!send_and_release(server, APP_CHANNEL_MSG_LAUNCH, ++last_ref, raw, len)) {
+	} else if (!app_launch_send_and_release(server, APP_CHANNEL_MSG_LAUNCH, ++last_ref, raw, len)) {
 		ret = APP_CONTROL_ERROR_IO_ERROR;
 	}
 	free(raw);

@@ -83,10 +83,19 @@ enum {
 	APP_CHANNEL_MSG_REPLY = 2,  /* ref_to: request number, response: result, data: reply */
 	APP_CHANNEL_MSG_TERMINATE = 3,
 	APP_CHANNEL_MSG_RESUME = 4,
+	APP_CHANNEL_MSG_PORT = 5, /* on a message port's socket, data: message_port.c's message */
 };
 
 /* Socket name of an app's launch channel (malloc'ed). */
 char *app_channel_name_get(const char *app_id);
+/* Socket name of an app's message port (malloc'ed). */
+char *app_channel_port_name_get(const char *app_id, const char *port);
+/* True when something listens on the socket of that name. */
+bool app_channel_socket_accepts(const char *name);
+/* A connection to the socket of that name, or NULL when nobody listens. */
+Ecore_Ipc_Server *app_channel_socket_connect(const char *name);
+/* Listens on the socket of that name (replacing a stale one); NULL when another process owns it. */
+Ecore_Ipc_Server *app_channel_server_add(const char *name);
 /* Removes the socket file of the channel name when nobody listens on it any more. */
 void app_channel_stale_remove(const char *name);
 /* A connection to the running app, or NULL when it is not running. */
@@ -97,6 +106,9 @@ bool app_channel_is_running(const char *app_id);
 int app_channel_send_resume(const char *app_id);
 /* Sends a request to an already running app_id, never starting it; APP_CONTROL_ERROR_*. */
 int app_launch_forward(app_control_h request, const char *app_id);
+/* Sends one message and leaves the connection to the receiver to close (desktop_app_launch_drain waits
+   for that); false if it could not be sent. */
+bool app_launch_send_and_release(Ecore_Ipc_Server *server, int major, int ref, const void *data, int size);
 
 /* ---- the running app's side (app_server.c) ---- */
 

@@ -106,16 +106,6 @@ static Eina_Bool client_del_cb(void *data, int type, void *event)
 	return ECORE_CALLBACK_DONE;
 }
 
-/* Ecore_Con complains loudly that local sockets cannot reuse ports; that is expected here. */
-static Ecore_Ipc_Server *server_add_quiet(const char *name)
-{
-	int level = eina_log_domain_level_get("ecore_con");
-	eina_log_domain_level_set("ecore_con", EINA_LOG_LEVEL_CRITICAL);
-	Ecore_Ipc_Server *s = ecore_ipc_server_add(ECORE_IPC_LOCAL_USER, name, 0, NULL);
-	eina_log_domain_level_set("ecore_con", level);
-	return s;
-}
-
 /* <runtime dir>/<id>.pid (malloc'ed) */
 static char *pid_file_path(const char *app_id)
 {
@@ -159,9 +149,7 @@ bool app_server_start(const char *app_id)
 		return true;
 	ecore_ipc_init();
 	char *name = app_channel_name_get(app_id);
-	if (name)
-		app_channel_stale_remove(name);
-	server = name ? server_add_quiet(name) : NULL;
+	server = name ? app_channel_server_add(name) : NULL;
 	free(name);
 	if (!server) {
 		ecore_ipc_shutdown();
