@@ -52,6 +52,23 @@ GstElement *media_gst_audio_sink_new(void)
 	return __device_new(MEDIA_AUDIO_SINK_ENV, "fake", "fakesink sync=true", "autoaudiosink");
 }
 
+bool media_gst_device_missing(GstElement *device)
+{
+	if (!GST_IS_BIN(device))
+		return false;
+	/* autoaudiosrc and autoaudiosink name their stand-ins "fake-...". */
+	bool fake = false;
+	GstIterator *it = gst_bin_iterate_elements(GST_BIN(device));
+	GValue item = G_VALUE_INIT;
+	while (gst_iterator_next(it, &item) == GST_ITERATOR_OK) {
+		fake = fake || g_str_has_prefix(GST_ELEMENT_NAME(g_value_get_object(&item)), "fake-");
+		g_value_reset(&item);
+	}
+	g_value_unset(&item);
+	gst_iterator_free(it);
+	return fake;
+}
+
 struct media_bus_watch_s {
 	GstBus *bus;
 	Ecore_Fd_Handler *handler;

@@ -19,6 +19,9 @@ bool media_gst_init(void);
 GstElement *media_gst_audio_source_new(void);
 GstElement *media_gst_audio_sink_new(void);
 
+/* True when a default device (once READY) found no sound server and stands in a silent element. */
+bool media_gst_device_missing(GstElement *device);
+
 /* Hands every message of a bus to cb on the main loop, through the bus's poll descriptor. cb may
    delete the watch (and what owns it); the rest of the messages then stay on the bus. */
 typedef void (*media_bus_cb)(GstMessage *message, void *data);

@@ -18,6 +18,7 @@
 
 struct recorder_pipeline_s {
 	GstElement *pipeline;
+	GstElement *source;
 	GstElement *sink;
 	media_bus_watch_t *watch;
 	recorder_pipeline_event_cb cb;
@@ -112,7 +113,7 @@ static void __message_cb(GstMessage *message, void *data)
 
 static bool __build(recorder_pipeline_t *p, int bitrate)
 {
-	GstElement *source = media_gst_audio_source_new();
+	GstElement *source = p->source = media_gst_audio_source_new();
 	GstElement *convert = gst_element_factory_make("audioconvert", NULL);
 	GstElement *resample = gst_element_factory_make("audioresample", NULL);
 	GstElement *filter = gst_element_factory_make("capsfilter", NULL);
@@ -126,7 +127,7 @@ static bool __build(recorder_pipeline_t *p, int bitrate)
 		for (size_t i = 0; i < G_N_ELEMENTS(made); i++)
 			if (made[i])
 				gst_object_unref(gst_object_ref_sink(made[i]));
-		p->sink = NULL;
+		p->source = p->sink = NULL;
 		return false;
 	}
 	GstCaps *caps = gst_caps_from_string("audio/x-raw,format=S16LE,rate=8000,channels=1");
@@ -160,8 +161,9 @@ recorder_pipeline_t *recorder_pipeline_new(int bitrate, recorder_pipeline_event_
 	p->limit_hit = -1;
 	*error = RECORDER_ERROR_DEVICE;
 	if (!__build(p, bitrate) || !(p->watch = media_bus_watch_add(p->pipeline, __message_cb, p)) ||
-	    gst_element_set_state(p->pipeline, GST_STATE_READY) == GST_STATE_CHANGE_FAILURE) {
-		LOGE("the microphone cannot be opened");
+	    gst_element_set_state(p->pipeline, GST_STATE_READY) == GST_STATE_CHANGE_FAILURE ||
+	    media_gst_device_missing(p->source)) {
+		LOGE("the microphone cannot be opened (%s=test records a test tone instead)", MEDIA_AUDIO_SOURCE_ENV);
 		recorder_pipeline_free(p);
 		return NULL;
 	}
