@@ -72,6 +72,7 @@ TEST_F(Player, PlaysToTheEndPausesAndSeeks)
 	ASSERT_EQ(PLAYER_ERROR_NONE, player_get_duration(player, &duration));
 	EXPECT_GT(duration, 1800);
 	EXPECT_LT(duration, 2700);
+	EXPECT_NEAR(durationOf(file) * 1000, duration, 20);
 	EXPECT_EQ(PLAYER_ERROR_INVALID_STATE, player_pause(player));
 
 	ASSERT_EQ(PLAYER_ERROR_NONE, player_start(player));

@@ -8,6 +8,7 @@
 #include <string.h>
 #include <vconf.h>
 
+#include "media/media_amr.h"
 #include "media/media_gst.h"
 #include "media/media_policy.h"
 
@@ -186,12 +187,18 @@ static player_error_e __prepare_error(GstElement *playbin)
 	return rc;
 }
 
-/* Parsers of some formats (AMR among them) tell no duration: the discoverer reads the whole file. */
+/* Parsers of some formats (AMR among them) tell no duration: AMR files are counted, others are read
+   through by the discoverer. */
 static int __duration_ms(player_h p)
 {
 	gint64 ns = 0;
 	if (gst_element_query_duration(p->playbin, GST_FORMAT_TIME, &ns) && ns >= 0)
 		return (int)(ns / GST_MSECOND);
+	gchar *path = g_filename_from_uri(p->uri, NULL, NULL);
+	int amr_ms = media_amr_duration_ms(path);
+	g_free(path);
+	if (amr_ms >= 0)
+		return amr_ms;
 	GstDiscoverer *discoverer = gst_discoverer_new(PREPARE_WAIT, NULL);
 	GstDiscovererInfo *info = discoverer ? gst_discoverer_discover_uri(discoverer, p->uri, NULL) : NULL;
 	GstClockTime d = info ? gst_discoverer_info_get_duration(info) : GST_CLOCK_TIME_NONE;
