@@ -108,6 +108,10 @@ static void terminate(void)
 
 int main(int argc, char **argv)
 {
-	static const companion_app_s app = {"share-clipboard", "Copy to clipboard", create, request, terminate};
+	static const companion_app_s app = {.name = "share-clipboard",
+	                                    .title = "Copy to clipboard",
+	                                    .create = create,
+	                                    .request = request,
+	                                    .terminate = terminate};
 	return companion_main(argc, argv, &app);
 }
