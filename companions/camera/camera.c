@@ -181,6 +181,7 @@ static void terminate(void)
 
 int main(int argc, char **argv)
 {
-	static const companion_app_s app = {"camera", "Camera", create, request, terminate};
+	static const companion_app_s app = {
+	    .name = "camera", .title = "Camera", .create = create, .request = request, .terminate = terminate};
 	return companion_main(argc, argv, &app);
 }

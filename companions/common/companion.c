@@ -188,6 +188,18 @@ Evas_Object *companion_button_add(Evas_Object *box, const char *label, Evas_Smar
 
 /* ---- test hooks ---- */
 
+/* False for the plain canvas objects, which have no members to look into. */
+static bool is_group(Evas_Object *obj)
+{
+	static const char *const plain[] = {"rectangle", "image",   "text",    "textblock", "textgrid",
+	                                    "line",      "polygon", "vectors", "snapshot",  NULL};
+	const char *type = evas_object_type_get(obj);
+	for (int i = 0; type && plain[i]; i++)
+		if (!strcmp(type, plain[i]))
+			return false;
+	return true;
+}
+
 /* The shown, enabled button labelled text among obj and its members. */
 static Evas_Object *button_find(Evas_Object *obj, const char *text)
 {
@@ -197,6 +209,8 @@ static Evas_Object *button_find(Evas_Object *obj, const char *text)
 	const char *label = type && strstr(type, "utton") ? elm_object_text_get(obj) : NULL;
 	if (label && !strcmp(label, text) && !elm_object_disabled_get(obj))
 		return obj;
+	if (!is_group(obj))
+		return NULL;
 	Eina_List *members = evas_object_smart_members_get(obj);
 	Evas_Object *child, *found = NULL;
 	EINA_LIST_FREE(members, child)
@@ -210,9 +224,11 @@ static Eina_Bool test_click_cb(void *data)
 	(void)data;
 	const char *text = getenv(COMPANION_TEST_CLICK_ENV);
 	Evas_Object *button = NULL;
+	bool ready = !self.app->test_ready || self.app->test_ready();
 	/* The window's content hangs off the canvas, not off the window object. */
 	Evas *e = self.win ? evas_object_evas_get(self.win) : NULL;
-	for (Evas_Object *o = e ? evas_object_bottom_get(e) : NULL; o && !button && text; o = evas_object_above_get(o))
+	for (Evas_Object *o = e && ready ? evas_object_bottom_get(e) : NULL; o && !button && text;
+	     o = evas_object_above_get(o))
 		button = button_find(o, text);
 	int x, y, w, h;
 	if (button)

@@ -31,6 +31,8 @@ typedef struct {
 	void (*request)(app_control_h request);
 	/* The app ends; an unanswered request is answered "canceled" after this. May be NULL. */
 	void (*terminate)(void);
+	/* For the click test hook: true once the window is ready for the press (NULL: at once). */
+	bool (*test_ready)(void);
 } companion_app_s;
 
 /* Runs the app: one window with a vertical box, each request kept and handed to app->request. */

@@ -64,6 +64,14 @@ static bool create(Evas_Object *win, Evas_Object *box)
 	return true;
 }
 
+/* The test hook's press waits until the selector holds the preset file (it lists folders asynchronously). */
+static bool test_ready(void)
+{
+	const char *preset = getenv(COMPANION_TEST_SELECT_ENV);
+	const char *selected = elm_fileselector_selected_get(selector);
+	return !preset || !*preset || (selected && !strcmp(selected, preset));
+}
+
 /* Each request starts over in the Pictures folder (or on the test hook's file). */
 static void request(app_control_h request)
 {
@@ -80,6 +88,7 @@ static void request(app_control_h request)
 
 int main(int argc, char **argv)
 {
-	static const companion_app_s app = {"gallery", "Gallery", create, request, NULL};
+	static const companion_app_s app = {
+	    .name = "gallery", .title = "Gallery", .create = create, .request = request, .test_ready = test_ready};
 	return companion_main(argc, argv, &app);
 }

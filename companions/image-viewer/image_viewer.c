@@ -140,6 +140,7 @@ static bool create(Evas_Object *win, Evas_Object *box)
 
 int main(int argc, char **argv)
 {
-	static const companion_app_s app = {"image-viewer", "Image viewer", create, request, NULL};
+	static const companion_app_s app = {
+	    .name = "image-viewer", .title = "Image viewer", .create = create, .request = request};
 	return companion_main(argc, argv, &app);
 }

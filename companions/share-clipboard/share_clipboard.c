@@ -18,6 +18,7 @@ static struct {
 	Evas_Object *note;
 	Ecore_Timer *hide_timer;
 	char *clip; /* what the clipboard holds */
+	int own_losses; /* losses that our own setting of the clipboard may still report */
 } self;
 
 static Eina_Bool hide_cb(void *data)
@@ -32,6 +33,11 @@ static void selection_lost_cb(void *data, Elm_Sel_Type type)
 {
 	(void)data;
 	(void)type;
+	/* Setting the clipboard may report the loss of what this program held before: not a real loss. */
+	if (self.own_losses > 0) {
+		self.own_losses--;
+		return;
+	}
 	LOGI("the clipboard went to another owner");
 	ui_app_exit();
 }
@@ -71,10 +77,11 @@ static void request(app_control_h request)
 	}
 	char *clip = share_content_clip_text_new(&content);
 	share_content_clear(&content);
-	/* Taking the clipboard again from ourselves is no loss. */
-	elm_cnp_selection_loss_callback_set(self.note, ELM_SEL_TYPE_CLIPBOARD, NULL, NULL);
-	bool ok = elm_cnp_selection_set(self.note, ELM_SEL_TYPE_CLIPBOARD, ELM_SEL_FORMAT_TEXT, clip, strlen(clip));
+	/* Taking the clipboard again from ourselves is no loss (Elementary calls a loss callback even when
+	   it is unset, so one that knows is always in place). */
+	self.own_losses++;
 	elm_cnp_selection_loss_callback_set(self.note, ELM_SEL_TYPE_CLIPBOARD, selection_lost_cb, NULL);
+	bool ok = elm_cnp_selection_set(self.note, ELM_SEL_TYPE_CLIPBOARD, ELM_SEL_FORMAT_TEXT, clip, strlen(clip));
 	if (!ok) {
 		LOGE("the clipboard refused the text");
 		free(clip);
@@ -108,6 +115,10 @@ static void terminate(void)
 
 int main(int argc, char **argv)
 {
-	static const companion_app_s app = {"share-clipboard", "Copy to clipboard", create, request, terminate};
+	static const companion_app_s app = {.name = "share-clipboard",
+	                                    .title = "Copy to clipboard",
+	                                    .create = create,
+	                                    .request = request,
+	                                    .terminate = terminate};
 	return companion_main(argc, argv, &app);
 }

@@ -152,6 +152,7 @@ static void terminate(void)
 
 int main(int argc, char **argv)
 {
-	static const companion_app_s app = {"share-email", "Send by e-mail", create, request, terminate};
+	static const companion_app_s app = {
+	    .name = "share-email", .title = "Send by e-mail", .create = create, .request = request, .terminate = terminate};
 	return companion_main(argc, argv, &app);
 }

@@ -207,6 +207,10 @@ static void terminate(void)
 
 int main(int argc, char **argv)
 {
-	static const companion_app_s app = {"share-save", "Save to a folder", create, request, terminate};
+	static const companion_app_s app = {.name = "share-save",
+	                                    .title = "Save to a folder",
+	                                    .create = create,
+	                                    .request = request,
+	                                    .terminate = terminate};
 	return companion_main(argc, argv, &app);
 }

@@ -144,6 +144,7 @@ static void terminate(void)
 
 int main(int argc, char **argv)
 {
-	static const companion_app_s app = {"storage-settings", "Storage", create, request, terminate};
+	static const companion_app_s app = {
+	    .name = "storage-settings", .title = "Storage", .create = create, .request = request, .terminate = terminate};
 	return companion_main(argc, argv, &app);
 }

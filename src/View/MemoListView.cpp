@@ -8,6 +8,7 @@
 #include <WUiTimer.h>
 
 #include "DataBase/MemoDbMgr.h"
+#include "DataBase/MemoDocInfo.h"
 #include "List/MemoGridControl.h"
 #include "List/MemoGridItem.h"
 #include "List/MemoItemList.h"

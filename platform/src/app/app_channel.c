@@ -145,17 +145,37 @@ pid_t app_channel_owner_pid(const char *app_id)
 	return (pid_t)atoi(text);
 }
 
-int app_channel_listen(const char *app_id)
+/* Binds and listens on the socket at addr, replacing one that a dead owner left; -1 on failure. */
+static int listen_at(const struct sockaddr_un *addr)
 {
-	struct sockaddr_un addr;
-	if (!address_get(app_id, &addr))
+	unlink(addr->sun_path);
+	int fd = socket_new();
+	if (fd < 0 || bind(fd, (const struct sockaddr *)addr, sizeof(*addr)) != 0 || listen(fd, SOMAXCONN) != 0) {
+		LOGE("cannot listen on %s: %s", addr->sun_path, strerror(errno));
+		if (fd >= 0)
+			close(fd);
 		return -1;
-	char *dir = strdup(addr.sun_path);
+	}
+	return fd;
+}
+
+static bool socket_dir_make(const struct sockaddr_un *addr)
+{
+	char *dir = strdup(addr->sun_path);
 	char *slash = dir ? strrchr(dir, '/') : NULL;
 	if (slash)
 		*slash = '\0';
 	bool have_dir = slash && app_paths_mkdir_p(dir);
 	free(dir);
+	return have_dir;
+}
+
+int app_channel_listen(const char *app_id)
+{
+	struct sockaddr_un addr;
+	if (!address_get(app_id, &addr))
+		return -1;
+	bool have_dir = socket_dir_make(&addr);
 	char lock_path[SOCKET_PATH_MAX + 8];
 	lock_path_get(&addr, lock_path, sizeof(lock_path));
 	int lock_fd = have_dir ? open(lock_path, O_RDWR | O_CREAT | O_CLOEXEC, 0600) : -1;
@@ -169,17 +189,44 @@ int app_channel_listen(const char *app_id)
 	if (ftruncate(lock_fd, 0) != 0 || pwrite(lock_fd, pid, (size_t)len, 0) != len)
 		LOGE("cannot note the pid in %s", lock_path);
 	/* A socket left by an instance that died would keep the new one from listening. */
-	unlink(addr.sun_path);
-	int fd = socket_new();
-	if (fd < 0 || bind(fd, (struct sockaddr *)&addr, sizeof(addr)) != 0 || listen(fd, SOMAXCONN) != 0) {
-		LOGE("cannot listen on %s: %s", addr.sun_path, strerror(errno));
-		if (fd >= 0)
-			close(fd);
+	int fd = listen_at(&addr);
+	if (fd < 0) {
 		close(lock_fd);
 		return -1;
 	}
 	owner_lock_fd = lock_fd;
 	return fd;
+}
+
+char *app_channel_port_id_get(const char *app_id, const char *port)
+{
+	char *id = NULL;
+	if (!app_id || !port || asprintf(&id, "%s@%s", app_id, port) < 0)
+		return NULL;
+	return id;
+}
+
+int app_channel_port_listen(const char *port_id)
+{
+	struct sockaddr_un addr;
+	if (!address_get(port_id, &addr) || !socket_dir_make(&addr))
+		return -1;
+	/* A port another live process listens on stays its own. */
+	if (app_channel_is_running(port_id)) {
+		LOGE("%s is taken by another process", port_id);
+		return -1;
+	}
+	return listen_at(&addr);
+}
+
+void app_channel_port_unlisten(const char *port_id, int fd)
+{
+	struct sockaddr_un addr;
+	if (fd < 0)
+		return;
+	close(fd);
+	if (address_get(port_id, &addr))
+		unlink(addr.sun_path);
 }
 
 void app_channel_unlisten(const char *app_id, int fd)

@@ -96,6 +96,20 @@ static void win_del_cb(void *data, Evas *e, Evas_Object *obj, void *event_info)
 	ecore_job_add(finish_job_cb, c);
 }
 
+static void win_del_job_cb(void *data)
+{
+	chooser_s *c = data;
+	if (c->win)
+		evas_object_del(c->win);
+}
+
+/* The window goes after the callback that closes it has returned. */
+static void close_soon(chooser_s *c)
+{
+	evas_object_hide(c->win);
+	ecore_job_add(win_del_job_cb, c);
+}
+
 static void item_selected_cb(void *data, Evas_Object *obj, void *event_info)
 {
 	(void)obj;
@@ -104,15 +118,14 @@ static void item_selected_cb(void *data, Evas_Object *obj, void *event_info)
 	if (c->chosen || !id)
 		return;
 	c->chosen = strdup(id);
-	evas_object_del(c->win);
+	close_soon(c);
 }
 
 static void cancel_clicked_cb(void *data, Evas_Object *obj, void *event_info)
 {
 	(void)obj;
 	(void)event_info;
-	chooser_s *c = data;
-	evas_object_del(c->win);
+	close_soon(data);
 }
 
 /* The app's icon from the registry, or NULL. */
@@ -138,7 +151,7 @@ static void list_add_app(Evas_Object *list, char *id)
 		app_info_get_icon(info, &icon_path);
 		app_info_destroy(info);
 	}
-	elm_list_item_append(list, label ? label : id, icon_new(list, icon_path), NULL, item_selected_cb, id);
+	elm_list_item_append(list, label ? label : id, icon_new(list, icon_path), NULL, NULL, id);
 	free(label);
 	free(icon_path);
 }
@@ -174,6 +187,7 @@ static void chooser_show(chooser_s *c)
 	char *id;
 	EINA_LIST_FOREACH(c->ids, l, id)
 	list_add_app(list, id);
+	evas_object_smart_callback_add(list, "selected", item_selected_cb, c);
 	elm_list_go(list);
 	elm_box_pack_end(box, list);
 	evas_object_show(list);
@@ -214,7 +228,7 @@ int app_chooser_send(app_control_h request, app_control_reply_cb callback, void 
 		ids_free(collect.ids);
 		return APP_CONTROL_ERROR_OUT_OF_MEMORY;
 	}
-	c->ids = collect.ids;
+	c->ids = eina_list_sort(collect.ids, 0, EINA_COMPARE_CB(strcmp));
 	c->callback = callback;
 	c->user_data = user_data;
 	/* A process that has no windows of its own gets the toolkit for the chooser's life. */

@@ -97,6 +97,7 @@ enum {
 	APP_CHANNEL_MSG_REPLY = 2,  /* ref: the request answered, response: result, data: reply */
 	APP_CHANNEL_MSG_TERMINATE = 3,
 	APP_CHANNEL_MSG_RESUME = 4,
+	APP_CHANNEL_MSG_PORT = 5, /* on a message port's socket, data: message_port.c's message */
 };
 
 typedef struct {
@@ -137,6 +138,12 @@ bool app_channel_is_running(const char *app_id);
 int app_channel_listen(const char *app_id);
 /* Closes the listening socket and gives up the ownership taken by app_channel_listen. */
 void app_channel_unlisten(const char *app_id, int fd);
+/* The socket id of an app's message port, "<app id>@<port>" (malloc'ed); app_channel_connect and
+   app_channel_is_running take it like an app id. */
+char *app_channel_port_id_get(const char *app_id, const char *port);
+/* Listens on a message port's socket (non-blocking); -1 when another process listens there. */
+int app_channel_port_listen(const char *port_id);
+void app_channel_port_unlisten(const char *port_id, int fd);
 /* Pid of the process that owns app_id's launch socket, or -1. */
 pid_t app_channel_owner_pid(const char *app_id);
 /* Asks a running app to bring its windows to the front; APP_CONTROL_ERROR_* (APP_NOT_FOUND if not running). */
