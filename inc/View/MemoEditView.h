@@ -71,6 +71,10 @@ public:
 	static const int PALETTE_SIZE = 7;
 
 private:
+	// Tests reach what no user action starts (the attach panel) and what shows only for a moment (the
+	// processing popup).
+	friend struct MemoEditViewTestAccess;
+
 	MemoEditView(const MemoEditView &) = delete;
 	MemoEditView &operator=(const MemoEditView &) = delete;
 

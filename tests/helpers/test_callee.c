@@ -1,8 +1,12 @@
 /* A small app for the launch tests. Each request it gets is written to "$TEST_CALLEE_DIR/<app id>.log":
-   "request first=<0|1> op=<operation> caller=<id>", then "extra <key>=<value>" (arrays "a,b"), then "end".
+   "request first=<0|1> op=<operation>", "caller=<id>", "uri=<uri>" and "mime=<type>" when set, then
+   "extra <key>=<value>" (arrays "a,b"), then "end".
    The request's extra data steer it: "reply" = succeeded|failed answers with the request's extra data
    plus "echo"="<app id>"; "die" = 1 ends the process at once without answering; "quit" = 1 ends it
-   normally. Events are logged too ("pause", "resume", "terminate"). */
+   normally. Events are logged too ("pause", "resume", "terminate").
+   A file "$TEST_CALLEE_DIR/<app id>.reply" answers every request as well, for requests whose extra data the
+   test cannot choose: a line "result=succeeded|failed|canceled", lines "extra <key>=<value>" and
+   "array <key>=<a>,<b>" (an empty value gives no entry); the reply also carries the request's extra data. */
 #include <Elementary.h>
 #include <app.h>
 
@@ -102,6 +106,53 @@ static void answer(app_control_h request, app_control_result_e result)
 	app_control_destroy(reply);
 }
 
+/* Answers from the reply file, if the test left one. */
+static void answer_from_file(app_control_h request)
+{
+	const char *dir = getenv("TEST_CALLEE_DIR");
+	char *id = NULL;
+	app_get_id(&id);
+	char path[4096];
+	snprintf(path, sizeof(path), "%s/%s.reply", dir ? dir : "/tmp", id ? id : "unknown");
+	free(id);
+	FILE *f = fopen(path, "r");
+	if (!f)
+		return;
+	app_control_h reply = NULL;
+	app_control_create(&reply);
+	app_control_foreach_extra_data(request, copy_extra_cb, reply);
+	app_control_result_e result = APP_CONTROL_RESULT_SUCCEEDED;
+	char line[4096];
+	while (fgets(line, sizeof(line), f)) {
+		line[strcspn(line, "\n")] = '\0';
+		char *eq = strchr(line, '=');
+		if (!eq)
+			continue;
+		*eq = '\0';
+		const char *value = eq + 1;
+		if (!strcmp(line, "result")) {
+			result = !strcmp(value, "failed")     ? APP_CONTROL_RESULT_FAILED
+			         : !strcmp(value, "canceled") ? APP_CONTROL_RESULT_CANCELED
+			                                      : APP_CONTROL_RESULT_SUCCEEDED;
+		} else if (!strncmp(line, "extra ", 6)) {
+			app_control_add_extra_data(reply, line + 6, value);
+		} else if (!strncmp(line, "array ", 6)) {
+			const char *items[64];
+			int n = 0;
+			char *save = NULL;
+			for (char *tok = strtok_r((char *)value, ",", &save); tok && n < 64; tok = strtok_r(NULL, ",", &save))
+				items[n++] = tok;
+			app_control_add_extra_data_array(reply, line + 6, items, n);
+		}
+	}
+	fclose(f);
+	int ret = app_control_reply_to_launch_request(reply, request, result);
+	char code[16];
+	snprintf(code, sizeof(code), "%d", ret);
+	log_line("replied %s%s", code, NULL);
+	app_control_destroy(reply);
+}
+
 static void request_cb(app_control_h request, void *user_data)
 {
 	(void)user_data;
@@ -112,6 +163,15 @@ static void request_cb(app_control_h request, void *user_data)
 	snprintf(head, sizeof(head), "request first=%d", requests_seen++ == 0);
 	log_line("%s op=%s", head, op);
 	log_line("caller=%s%s", caller ? caller : "-", NULL);
+	char *uri = NULL, *mime = NULL;
+	app_control_get_uri(request, &uri);
+	app_control_get_mime(request, &mime);
+	if (uri)
+		log_line("uri=%s%s", uri, NULL);
+	if (mime)
+		log_line("mime=%s%s", mime, NULL);
+	free(uri);
+	free(mime);
 	free(op);
 	free(caller);
 	app_control_foreach_extra_data(request, log_extra_cb, NULL);
@@ -123,6 +183,8 @@ static void request_cb(app_control_h request, void *user_data)
 		answer(request, APP_CONTROL_RESULT_SUCCEEDED);
 	else if (extra_is(request, "reply", "failed"))
 		answer(request, APP_CONTROL_RESULT_FAILED);
+	else
+		answer_from_file(request);
 	if (extra_is(request, "quit", "1"))
 		ui_app_exit();
 }
