@@ -21,6 +21,7 @@ using app_assist::WUiTimer;
 
 // The menu follows the keypad's or the attach panel's going down by this much.
 static const double MENU_DELAY = 0.1;
+static const char *const MENU_STYLE = "more/memo";
 
 bool MemoEditView::__isKeypadOpen()
 {
@@ -82,6 +83,8 @@ void MemoEditView::__createMoreMenu(bool keypadWasOpen)
 		menu->destroy();
 		return;
 	}
+	// The page's own menu look (theme style "more/memo").
+	elm_object_style_set(menu->getEvasObj(), MENU_STYLE);
 	const bool isQuick = __info && __info->getIsQuick();
 	MemoDbMgr *db = MemoDbMgr::getInstance();
 
