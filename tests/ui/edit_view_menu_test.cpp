@@ -25,70 +25,53 @@ const char *const SHARE_TEXT = "http://tizen.org/appcontrol/operation/share_text
 const char *const MULTI_SHARE = "http://tizen.org/appcontrol/operation/multi_share";
 } // namespace
 
-TEST_F(EditViewMenu, RowsFollowTheModeAndPowerSaving)
+TEST_F(EditViewMenu, RowsFollowTheModePowerSavingAndTheQuickMemo)
 {
-	MemoEditView *view = openNew();
-	EXPECT_EQ(texts({"IDS_MEMO_OPT_ADD_CHECKLIST_ABB", "IDS_MEMO_OPT_INSERT_IMAGE_ABB",
-	                 "IDS_MEMO_OPT_RECORD_AUDIO_ABB2", "IDS_MEMO_OPT_CHANGE_MEMO_COLOUR_ABB"}),
-	          openMenu());
+	openNew();
+	const std::vector<std::string> editing =
+	    texts({"IDS_MEMO_OPT_ADD_CHECKLIST_ABB", "IDS_MEMO_OPT_INSERT_IMAGE_ABB", "IDS_MEMO_OPT_RECORD_AUDIO_ABB2",
+	           "IDS_MEMO_OPT_CHANGE_MEMO_COLOUR_ABB"});
+	EXPECT_EQ(editing, openMenu());
 	pressKey("Escape");
-	settle();
-	ASSERT_TRUE(isTop(view));
-
-	// Power saving takes the picture row away.
-	vconf_set_int("db/setting/psmode", 1);
-	EXPECT_EQ(texts({"IDS_MEMO_OPT_ADD_CHECKLIST_ABB", "IDS_MEMO_OPT_RECORD_AUDIO_ABB2",
-	                 "IDS_MEMO_OPT_CHANGE_MEMO_COLOUR_ABB"}),
-	          openMenu());
+	vconf_set_int("db/setting/psmode", 1); // no pictures in power saving
+	EXPECT_EQ(std::vector<std::string>({editing[0], editing[2], editing[3]}), openMenu());
 	pressKey("Escape");
-	settle();
+	vconf_set_int("db/setting/psmode", 0);
 
-	// Reading a memo with text: edit, delete, share, and Edit turns it into an edit.
-	MemoEditView *reading = openRecord(storedMemo("Read", todoList(todoItem(0, false, "words"))));
-	EXPECT_EQ(texts({"IDS_MEMO_HEADER_EDIT_ABB2", "IDS_MEMO_OPT_DELETE", "IDS_MEMO_OPT_SHARE"}), openMenu());
-	chooseMenu(i18n_get_text("IDS_MEMO_HEADER_EDIT_ABB2"));
-	EXPECT_NE(nullptr, titleButton(reading, "title_right_btn"));
-	EXPECT_EQ(i18n_get_text("IDS_MEMO_OPT_ADD_CHECKLIST_ABB"), openMenu().at(0));
-}
-
-TEST_F(EditViewMenu, HideIsWrittenAtOnceEvenWhenTheEditIsDiscardedAndTheQuickMemoHasNeither)
-{
-	MemoDocInfo *record = storedMemo("Secret", todoList(todoItem(0, false, "words")));
-	const std::string uuid = record->getMemoUUID();
-	MemoEditView *view = new MemoEditView(record, false, false);
-	view->setHiddenMode(1);
-	push(view);
-	EXPECT_EQ(
-	    texts({"IDS_MEMO_OPT_HIDE_MEMO", "IDS_MEMO_HEADER_EDIT_ABB2", "IDS_MEMO_OPT_DELETE", "IDS_MEMO_OPT_SHARE"}),
-	    openMenu());
-	chooseMenu(i18n_get_text("IDS_MEMO_OPT_HIDE_MEMO"));
-	EXPECT_EQ("1", query("SELECT isHidden FROM memo WHERE UUID = '" + uuid + "'"));
-
-	EXPECT_EQ(i18n_get_text("IDS_MEMO_OPT_SHOW_MEMO"), openMenu().at(0));
-	chooseMenu(i18n_get_text("IDS_MEMO_HEADER_EDIT_ABB2"));
-	typeInto(items(view)[1], " more");
-	EXPECT_EQ(i18n_get_text("IDS_MEMO_OPT_SHOW_MEMO"), openMenu().at(0));
-	pressKey("Escape"); // the menu
-	settle();
-	pressKey("Escape"); // the page
-	settle();
-	tapObject(popupButton(2)); // Discard
-	ASSERT_TRUE(waitFor([this] { return lastPagePopped; }));
-	EXPECT_EQ("1", query("SELECT isHidden FROM memo WHERE UUID = '" + uuid + "'"));
-	EXPECT_EQ(std::string::npos, query("SELECT tizenXmlContent FROM memo WHERE UUID = '" + uuid + "'").find("more"));
-
-	// The quick memo is neither hidden nor coloured.
+	// The quick memo is neither hidden nor coloured, even opened from the hidden memos.
 	ASSERT_TRUE(MemoDbMgr::getInstance()->addQuickMemo("quick words"));
-	const std::string quickUuid = query("SELECT UUID FROM memo WHERE isQuick = 1");
-	records.emplace_back(MemoDbMgr::getInstance()->getOneMemoN(quickUuid.c_str()));
+	records.emplace_back(
+	    MemoDbMgr::getInstance()->getOneMemoN(query("SELECT UUID FROM memo WHERE isQuick = 1").c_str()));
 	MemoEditView *quick = new MemoEditView(records.back().get(), false, false);
 	quick->setHiddenMode(1);
 	push(quick);
 	EXPECT_EQ(texts({"IDS_MEMO_HEADER_EDIT_ABB2", "IDS_MEMO_OPT_DELETE", "IDS_MEMO_OPT_SHARE"}), openMenu());
 	chooseMenu(i18n_get_text("IDS_MEMO_HEADER_EDIT_ABB2"));
-	EXPECT_EQ(
-	    texts({"IDS_MEMO_OPT_ADD_CHECKLIST_ABB", "IDS_MEMO_OPT_INSERT_IMAGE_ABB", "IDS_MEMO_OPT_RECORD_AUDIO_ABB2"}),
-	    openMenu());
+	EXPECT_NE(nullptr, titleButton(quick, "title_right_btn"));
+	EXPECT_EQ(std::vector<std::string>(editing.begin(), editing.end() - 1), openMenu());
+}
+
+TEST_F(EditViewMenu, HideIsWrittenAtOnceEvenWhenTheEditIsDiscarded)
+{
+	MemoDocInfo *record = storedMemo("Secret", todoList(todoItem(0, false, "words")));
+	const std::string hidden = "SELECT isHidden FROM memo WHERE UUID = '" + std::string(record->getMemoUUID()) + "'";
+	MemoEditView *view = new MemoEditView(record, false, false);
+	view->setHiddenMode(1);
+	push(view);
+	EXPECT_EQ(i18n_get_text("IDS_MEMO_OPT_HIDE_MEMO"), openMenu().at(0));
+	chooseMenu(i18n_get_text("IDS_MEMO_OPT_HIDE_MEMO"));
+	EXPECT_EQ("1", query(hidden));
+
+	openMenu();
+	chooseMenu(i18n_get_text("IDS_MEMO_HEADER_EDIT_ABB2"));
+	typeInto(items(view)[1], " more");
+	EXPECT_EQ(i18n_get_text("IDS_MEMO_OPT_SHOW_MEMO"), openMenu().at(0));
+	pressKey("Escape"); // the menu
+	pressKey("Escape"); // the page
+	settle();
+	tapObject(popupButton(2)); // Discard
+	ASSERT_TRUE(waitFor([this] { return lastPagePopped; }));
+	EXPECT_EQ("1", query(hidden));
 }
 
 TEST_F(EditViewMenu, ColourChosenShowsAtOnceAndIsSaved)
@@ -99,17 +82,11 @@ TEST_F(EditViewMenu, ColourChosenShowsAtOnceAndIsSaved)
 	chooseMenu(i18n_get_text("IDS_MEMO_OPT_CHANGE_MEMO_COLOUR_ABB"));
 	Evas_Object *selector = elm_object_part_content_get(view->getEvasObj(), "colorselector");
 	ASSERT_NE(selector, nullptr);
-	Elm_Object_Item *swatch =
-	    static_cast<Elm_Object_Item *>(eina_list_nth(elm_colorselector_palette_items_get(selector), 3));
-	ASSERT_NE(swatch, nullptr);
-	tapItem(swatch);
+	tapItem(static_cast<Elm_Object_Item *>(eina_list_nth(elm_colorselector_palette_items_get(selector), 3)));
 	settle();
-
-	int r = 0, g = 0, b = 0;
-	elm_bg_color_get(elm_object_part_content_get(view->getEvasObj(), "changeable_bg"), &r, &g, &b);
-	EXPECT_EQ(145, r);
-	EXPECT_EQ(224, g);
-	EXPECT_EQ(242, b);
+	int rgb[3] = {0, 0, 0};
+	elm_bg_color_get(elm_object_part_content_get(view->getEvasObj(), "changeable_bg"), &rgb[0], &rgb[1], &rgb[2]);
+	EXPECT_EQ(std::vector<int>({145, 224, 242}), std::vector<int>(rgb, rgb + 3));
 	pressDone(view);
 	ASSERT_TRUE(waitFor([this] { return lastPagePopped; }));
 	EXPECT_EQ("145;224;242;255;", query("SELECT bgColor FROM memo WHERE isQuick = 0"));
@@ -118,28 +95,19 @@ TEST_F(EditViewMenu, ColourChosenShowsAtOnceAndIsSaved)
 TEST_F(EditViewMenu, ShareSendsTextWithThePathsOrTheFilesAlone)
 {
 	registerApp("test.share", std::string(SHARE_TEXT) + "," + MULTI_SHARE);
-	// A memo with a title, two check lines and a picture with its file row.
+	// A memo of `lines` and a picture with its file row; the picture's copy for sharing.
 	auto withPicture = [this](const char *name, const char *title, const std::string &lines) {
-		char *uuid = nullptr;
-		MemoUtil::createUUIDN(&uuid);
-		const std::string picture = mediaDir(uuid) + name + ".jpg";
-		ecore_file_mkpath(mediaDir(uuid).c_str());
+		const std::string uuid = std::string(name) + "-memo", picture = mediaDir(uuid.c_str()) + name + ".jpg";
+		ecore_file_mkpath(mediaDir(uuid.c_str()).c_str());
 		EXPECT_TRUE(writePicture(picture, 200, 150));
+		MemoDocInfo *record =
+		    storedMemo(title, todoList(lines + todoItem(0, false, escapedTag(200, 150, picture))), uuid.c_str());
 		MemoFileInfo file;
 		file.setFileUUID(name);
-		file.setMemoUUID(uuid);
-		file.setMimeType("image/jpeg");
+		file.setMemoUUID(uuid.c_str());
 		file.setPath(picture.c_str());
-		MemoDocInfo record;
-		record.setMemoUUID(uuid);
-		record.setTitle(title);
-		record.setTizenXmlContent(todoList(lines + todoItem(0, false, escapedTag(200, 150, picture))).c_str());
-		record.setFileCount(1);
-		record.copyFileInfos(&file);
-		EXPECT_TRUE(MemoDbMgr::getInstance()->addMemo(&record));
-		records.emplace_back(MemoDbMgr::getInstance()->getOneMemoN(uuid));
-		free(uuid);
-		return records.back().get();
+		EXPECT_TRUE(MemoDbMgr::getInstance()->addNewFile(&file));
+		return record;
 	};
 	auto sharedCopy = [](MemoDocInfo *record, const char *name) {
 		char *shared = app_get_shared_data_path();

@@ -185,6 +185,19 @@ static void sheet_build(attach_panel_h panel)
 	place_sheet(panel);
 }
 
+/* The conformant may go first (the window closes): the sheet goes with it, and the panel lives on empty. */
+static void conformant_del_cb(void *data, Evas *e, Evas_Object *obj, void *event_info)
+{
+	(void)e;
+	(void)obj;
+	(void)event_info;
+	attach_panel_h panel = data;
+	panel->conformant = NULL;
+	panel->sheet = NULL;
+	panel->selector = NULL;
+	panel->visible = false;
+}
+
 int attach_panel_create(Evas_Object *conformant, attach_panel_h *attach_panel)
 {
 	if (!conformant || !attach_panel)
@@ -196,6 +209,7 @@ int attach_panel_create(Evas_Object *conformant, attach_panel_h *attach_panel)
 		return panel_error(ATTACH_PANEL_ERROR_OUT_OF_MEMORY, __func__, "out of memory");
 	panel->conformant = conformant;
 	evas_object_data_set(conformant, PANEL_KEY, panel);
+	evas_object_event_callback_add(conformant, EVAS_CALLBACK_DEL, conformant_del_cb, panel);
 	*attach_panel = panel;
 	return ATTACH_PANEL_ERROR_NONE;
 }
@@ -206,17 +220,18 @@ int attach_panel_destroy(attach_panel_h attach_panel)
 		return INVALID_PARAMETER();
 	if (attach_panel->autoselect_job)
 		ecore_job_del(attach_panel->autoselect_job);
-	if (attach_panel->sheet) {
-		evas_object_event_callback_del_full(attach_panel->conformant, EVAS_CALLBACK_RESIZE, conformant_geometry_cb,
-		                                    attach_panel);
-		evas_object_event_callback_del_full(attach_panel->conformant, EVAS_CALLBACK_MOVE, conformant_geometry_cb,
-		                                    attach_panel);
-		evas_object_del(attach_panel->sheet);
+	Evas_Object *conformant = attach_panel->conformant;
+	if (conformant) {
+		evas_object_event_callback_del_full(conformant, EVAS_CALLBACK_RESIZE, conformant_geometry_cb, attach_panel);
+		evas_object_event_callback_del_full(conformant, EVAS_CALLBACK_MOVE, conformant_geometry_cb, attach_panel);
+		evas_object_event_callback_del_full(conformant, EVAS_CALLBACK_DEL, conformant_del_cb, attach_panel);
+		evas_object_data_del(conformant, PANEL_KEY);
 	}
+	if (attach_panel->sheet)
+		evas_object_del(attach_panel->sheet);
 	for (int c = 0; c < CATEGORY_COUNT; c++)
 		if (attach_panel->extra[c])
 			bundle_free(attach_panel->extra[c]);
-	evas_object_data_del(attach_panel->conformant, PANEL_KEY);
 	free(attach_panel);
 	return ATTACH_PANEL_ERROR_NONE;
 }
@@ -287,6 +302,8 @@ int attach_panel_show(attach_panel_h attach_panel)
 			attach_panel->autoselect_job = ecore_job_add(autoselect_job_cb, attach_panel);
 		return ATTACH_PANEL_ERROR_NONE;
 	}
+	if (!attach_panel->conformant)
+		return panel_error(ATTACH_PANEL_ERROR_ALREADY_DESTROYED, __func__, "the conformant has gone");
 	sheet_build(attach_panel);
 	evas_object_show(attach_panel->sheet);
 	evas_object_raise(attach_panel->sheet);

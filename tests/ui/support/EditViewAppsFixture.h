@@ -33,8 +33,7 @@ class EditViewAppsFixture : public EditViewFixture
 protected:
 	void SetUp() override
 	{
-		static const std::string apps = memo_test::makeTempDir("apps");
-		static const std::string logs = memo_test::makeTempDir("callees");
+		static const std::string apps = memo_test::makeTempDir("apps"), logs = memo_test::makeTempDir("callees");
 		appsDir = apps;
 		logDir = logs;
 		setenv("TIZEN_APPS_DIR", appsDir.c_str(), 1);
@@ -50,7 +49,13 @@ protected:
 			app_control_create(&h);
 			app_control_set_app_id(h, id.c_str());
 			if (app_control_send_terminate_request(h) == APP_CONTROL_ERROR_NONE)
-				waitFor([&] { return !isRunning(id); }, 10.0);
+				waitFor(
+				    [&] {
+					    bool running = false;
+					    app_manager_is_running(id.c_str(), &running);
+					    return !running;
+				    },
+				    10.0);
 			app_control_destroy(h);
 			unlink((logDir + "/" + id + ".log").c_str());
 			unlink((logDir + "/" + id + ".reply").c_str());
@@ -59,15 +64,15 @@ protected:
 		EditViewFixture::TearDown();
 	}
 
-	// Registers the callee as `id`, taking `operations` (comma separated) when the request names no app.
+	// Registers the callee as `id`, taking `operations` (comma separated) when a request names no app.
 	void registerApp(const std::string &id, const std::string &operations = "", const std::string &icon = "")
 	{
-		std::ofstream(appsDir + "/" + id + ".ini")
-		    << "[app]\nid=" << id << "\nexec=" << memo_test::helperPath("test_callee") << "\noperation=" << operations
-		    << "\nicon=" << icon << "\n";
+		std::ofstream(appsDir + "/" + id + ".ini") << "[app]\nid=" << id << "\nexec="
+		                                           << memo_test::helperPath("test_callee") << "\noperation="
+		                                           << operations << "\nicon=" << icon << "\n";
 		registered.insert(id);
 	}
-	// What the callee `id` answers to every request from now on (lines of its reply file).
+	// The answer of the callee `id` to every request from now on (see test_callee.c).
 	void setReply(const std::string &id, const std::string &lines)
 	{
 		std::ofstream(logDir + "/" + id + ".reply") << lines;
@@ -77,65 +82,54 @@ protected:
 	{
 		return waitFor([&] { return memo_test::countOf(calleeLog(id), text) >= times; }, 10.0);
 	}
-	static bool isRunning(const std::string &id)
-	{
-		bool running = false;
-		app_manager_is_running(id.c_str(), &running);
-		return running;
-	}
 
-	// Opens the more menu by its key and gives the texts of its rows, in order; empty when no menu opened.
+	// Opens the more menu by its key and gives the texts of its rows; empty when no menu opened.
 	std::vector<std::string> openMenu()
 	{
 		pressKey("F2");
 		settle(0.3);
 		std::vector<std::string> texts;
-		Evas_Object *list = menuList();
-		const Eina_List *l = nullptr;
-		void *data = nullptr;
-		EINA_LIST_FOREACH(list ? elm_list_items_get(list) : nullptr, l, data)
-		texts.push_back(elm_object_item_text_get(static_cast<Elm_Object_Item *>(data)));
+		for (Elm_Object_Item *item : menuItems())
+			texts.push_back(elm_object_item_text_get(item));
 		return texts;
+	}
+	// Taps the row of the open menu that reads `text`.
+	void chooseMenu(const std::string &text)
+	{
+		for (Elm_Object_Item *item : menuItems()) {
+			if (text == elm_object_item_text_get(item)) {
+				tapItem(item);
+				settle(0.3);
+				return;
+			}
+		}
+		FAIL() << "no menu row " << text;
 	}
 	// Taps a widget item where it shows (the item may go with the tap).
 	void tapItem(Elm_Object_Item *item)
 	{
 		int x = 0, y = 0;
-		Evas_Object *track = elm_object_item_track(item);
-		centreOf(track, &x, &y);
+		centreOf(elm_object_item_track(item), &x, &y);
 		elm_object_item_untrack(item);
 		tap(x, y);
 	}
-	// Taps the row of the open menu that reads `text`.
-	void chooseMenu(const std::string &text)
-	{
-		Evas_Object *list = menuList();
-		ASSERT_NE(list, nullptr);
-		const Eina_List *l = nullptr;
-		void *data = nullptr;
-		EINA_LIST_FOREACH(elm_list_items_get(list), l, data)
-		{
-			Elm_Object_Item *item = static_cast<Elm_Object_Item *>(data);
-			if (text != elm_object_item_text_get(item))
-				continue;
-			tapItem(item);
-			settle(0.3);
-			return;
-		}
-		FAIL() << "no menu row " << text;
-	}
-	std::string appsDir;
-	std::string logDir;
+
+	std::string appsDir, logDir;
 	std::set<std::string> registered;
 
 private:
-	Evas_Object *menuList()
+	std::vector<Elm_Object_Item *> menuItems()
 	{
 		app_assist::WViewController *top = naviframe->getTopContentViewController();
 		app_assist::WViewController *menu = top ? top->getPopup() : nullptr;
-		return menu && dynamic_cast<app_assist::WMenuPopupController *>(menu)
-		           ? elm_object_content_get(menu->getEvasObj())
-		           : nullptr;
+		std::vector<Elm_Object_Item *> items;
+		if (!dynamic_cast<app_assist::WMenuPopupController *>(menu))
+			return items;
+		const Eina_List *l = nullptr;
+		void *data = nullptr;
+		EINA_LIST_FOREACH(elm_list_items_get(elm_object_content_get(menu->getEvasObj())), l, data)
+		items.push_back(static_cast<Elm_Object_Item *>(data));
+		return items;
 	}
 };
 
