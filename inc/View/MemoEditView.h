@@ -1,14 +1,14 @@
 #ifndef INC_VIEW_MEMOEDITVIEW_H
 #define INC_VIEW_MEMOEDITVIEW_H
 
+#include <string>
+
 #include <app_control.h>
 #include <attach_panel.h>
 #include <bundle.h>
 #include <call-manager.h>
 
 #include <Elementary.h>
-#include <string>
-
 #include <WContentViewController.h>
 
 #include "Box/MemoBoxControl.h"
