@@ -79,6 +79,9 @@ void WUiTimer::__end()
 Eina_Bool WUiTimer::__tickCb(void *data)
 {
 	WUiTimer *self = static_cast<WUiTimer *>(data);
+	// A main loop iterated from inside the function (a blocking call may do that) must not run it again.
+	if (self->__running)
+		return ECORE_CALLBACK_RENEW;
 	self->__running = true;
 	bool again = self->__func(self->__data);
 	self->__running = false;

@@ -1,7 +1,11 @@
 #ifndef INC_VIEW_MEMOEDITVIEW_H
 #define INC_VIEW_MEMOEDITVIEW_H
 
+#include <string>
+
 #include <app_control.h>
+#include <attach_panel.h>
+#include <bundle.h>
 #include <call-manager.h>
 
 #include <Elementary.h>
@@ -22,8 +26,11 @@ class MemoRecorder;
 // Files: MemoEditView.cpp (construction, push, teardown, public operations), MemoEditViewLayout.cpp (contents,
 // title bar, taps, modes, box signals), MemoEditViewEvents.cpp (rotation, broadcasts, calls),
 // MemoEditViewSave.cpp (change detection and the write), MemoEditViewFiles.cpp (file rows, thumbnail, media
-// folder), MemoEditViewPopups.cpp (Cancel, back, discard, storage and delete popups), MemoEditViewMenu.cpp
-// (more menu and colour selector), MemoEditViewVoice.cpp (what the voice panels will need).
+// folder), MemoEditViewPopups.cpp (Cancel, back, discard, storage and delete popups), MemoEditViewMore.cpp
+// (the more menu), MemoEditViewShare.cpp (the memo sent to other apps), MemoEditViewColor.cpp (colour
+// selector), MemoEditViewImages.cpp (pictures from the gallery and camera, and handed in at launch),
+// MemoEditViewViewer.cpp (a picture opened in the image viewer), MemoEditViewAttach.cpp (the attach panel),
+// MemoEditViewVoice.cpp (what the voice panels will need).
 class MemoEditView : public app_assist::WContentViewController
 {
 public:
@@ -64,6 +71,10 @@ public:
 	static const int PALETTE_SIZE = 7;
 
 private:
+	// Tests reach what no user action starts (the attach panel) and what shows only for a moment (the
+	// processing popup).
+	friend struct MemoEditViewTestAccess;
+
 	MemoEditView(const MemoEditView &) = delete;
 	MemoEditView &operator=(const MemoEditView &) = delete;
 
@@ -121,12 +132,65 @@ private:
 	void __createDeletePopup();
 	static void __launchStorageSettings();
 
-	// ---- More menu and colours (MemoEditViewMenu.cpp) ----
+	// ---- More menu (MemoEditViewMore.cpp) ----
 	static void __moreBtnCb(void *data, Evas_Object *obj, void *eventInfo);
-	void __createMoreMenu();
+	// `keypadWasOpen`: the keypad went down for the menu, so a recording needs not hold it back.
+	void __createMoreMenu(bool keypadWasOpen);
+	void __setHiddenState(bool hide);
+	void __onRecordMenuItem(bool keypadWasOpen);
+	bool __isKeypadOpen();
+
+	// ---- Sharing (MemoEditViewShare.cpp) ----
+	// The memo as text for other apps: title, body with "[  ]" / "[v]" check marks, no markup.
+	std::string __getShareText();
+	static bool __hasVisibleText(const std::string &text);
+	// Copies of the memo's files under the shared data folder, one per file; the caller frees them.
+	char **__getSharedCopiesN(int *count);
+	void __shareMemo();
+
+	// ---- Colour selector (MemoEditViewColor.cpp) ----
 	void __createColorSelector();
 	void __closeColorSelector(bool focus);
 	static void __colorSelectedCb(void *data, Evas_Object *obj, void *eventInfo);
+
+	// ---- Pictures from other apps (MemoEditViewImages.cpp) ----
+	static void __postImageLimitMessage();
+	int __getImageCount();
+	void __imageBtnCb();
+	void __createInsertPopup();
+	static Evas_Object *__getAppIcon(const char *appId, Evas_Object *parent);
+	static void __onGalleryClickedCb(void *data, Evas_Object *obj, const char *emission, const char *source);
+	static void __onCameraClickedCb(void *data, Evas_Object *obj, const char *emission, const char *source);
+	static void __onPopupBlockClickedCb(void *data, Evas_Object *obj, void *eventInfo);
+	void __launchPicker(bool camera);
+	static void __galleryCb(app_control_h request, app_control_h reply, app_control_result_e result, void *data);
+	// Copies `source` to `destination` and puts it in the text, shrinking it on a worker first when it is
+	// large. False when the picture is refused (told to the user).
+	bool __takePicture(const char *source, const char *destination);
+	// "<data>media/<memo>/<new uuid>" and the source's extension.
+	std::string __newImagePath(const char *source);
+	void __startImageJob();
+	static void __imgProcessThreadStartCb(void *data, Ecore_Thread *thread);
+	static void __imgProcessThreadEndCb(void *data, Ecore_Thread *thread);
+	static void __imgProcessThreadCancelCb(void *data, Ecore_Thread *thread);
+	void __afterPicturesIn();
+	// Cuts the workers loose: they end without the view.
+	void __cancelImageJobs();
+
+	// ---- Image viewer (MemoEditViewViewer.cpp) ----
+	void __onImageSelected(const char *path);
+	static void __imageViewerCb(app_control_h request, app_control_h reply, app_control_result_e result, void *data);
+
+	// ---- Attach panel (MemoEditViewAttach.cpp) ----
+	void __createAttachPanel();
+	void __destroyAttachPanel();
+	bool __isAttachPanelOpened();
+	bundle *__attachRoomBundleN();
+	static void __attachPanelResultCb(attach_panel_h panel, attach_panel_content_category_e category,
+	                                  app_control_h result, app_control_result_e resultCode, void *data);
+	static void __attachPanelThreadStartCb(void *data, Ecore_Thread *thread);
+	static void __attachPanelThreadEndCb(void *data, Ecore_Thread *thread);
+	static void __attachPanelThreadCancelCb(void *data, Ecore_Thread *thread);
 
 	// ---- Voice (MemoEditViewVoice.cpp) ----
 	// True while a recorder holds a recording handle, that is while it records.
@@ -139,7 +203,8 @@ private:
 	void __destroyPlayer();
 	void __createPlayer(bool withDeleteButton);
 	char *__getVrPathN(const char *uuid);
-	void __destroyAttachPanel();
+	// Opens the recorder panel.
+	void __audioBtnCb();
 
 	MemoBoxControl *__boxControl;
 	MemoPlayer *__player;
@@ -164,9 +229,10 @@ private:
 	char *__imagePath;
 	int __imageWidth;
 	int __imageHeight;
-	int __imageScale;
+	float __imageScale; // the shrink factor, a fraction
 	int __isHiddenMode;
 	Ecore_Thread *__threadHandle; // the last image worker ("__thread" is a compiler keyword)
+	Eina_List *__imageJobs;       // the workers under way, cut loose from the view when it goes
 	int __isPortrait;
 	cm_client_h __callHandle;
 	bool __canSave;
@@ -178,7 +244,7 @@ private:
 	int __colorIndex;
 	int __palette[PALETTE_SIZE][4];
 	bool __isImmediateLayout;
-	void *__attachPanel; // no flow opens the attach panel
+	attach_panel_h __attachPanel; // no flow opens the attach panel
 	app_control_h __attachResult;
 	Eina_List *__attachedPaths;
 	bool __isAppPaused;

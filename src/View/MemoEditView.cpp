@@ -35,11 +35,11 @@ MemoEditView::MemoEditView(MemoDocInfo *info, bool external, bool immediateLayou
       __isPlayerDeleted(0), __isRecorderDeleted(0), __isNewHidden(0), __UUID(nullptr), __vrUUID(nullptr),
       __mediaPath(nullptr), __thumbPath(nullptr), __displayContent(nullptr), __mode(MODE_NEW), __cancelBtn(nullptr),
       __doneBtn(nullptr), __audioBtn(nullptr), __colorSelector(nullptr), __bgObject(nullptr),
-      __processingPopup(nullptr), __imagePath(nullptr), __imageWidth(0), __imageHeight(0), __imageScale(0),
-      __isHiddenMode(0), __threadHandle(nullptr), __isPortrait(1), __callHandle(nullptr), __canSave(true),
-      __isLaunching(false), __viewerCopyPath(nullptr), __viewerPopup(nullptr), __downX(0), __downY(0), __colorIndex(0),
-      __isImmediateLayout(immediateLayout), __attachPanel(nullptr), __attachResult(nullptr), __attachedPaths(nullptr),
-      __isAppPaused(false), __isDiscarded(false), __saveFailed(false)
+      __processingPopup(nullptr), __imagePath(nullptr), __imageWidth(0), __imageHeight(0), __imageScale(1.0f),
+      __isHiddenMode(0), __threadHandle(nullptr), __imageJobs(nullptr), __isPortrait(1), __callHandle(nullptr),
+      __canSave(true), __isLaunching(false), __viewerCopyPath(nullptr), __viewerPopup(nullptr), __downX(0), __downY(0),
+      __colorIndex(0), __isImmediateLayout(immediateLayout), __attachPanel(nullptr), __attachResult(nullptr),
+      __attachedPaths(nullptr), __isAppPaused(false), __isDiscarded(false), __saveFailed(false)
 {
 	memcpy(__palette, PALETTE, sizeof(__palette));
 	if (info) {
@@ -61,8 +61,7 @@ MemoEditView::~MemoEditView()
 	free(__viewerCopyPath);
 	if (__processingPopup)
 		evas_object_del(__processingPopup);
-	if (__threadHandle)
-		ecore_thread_cancel(__threadHandle);
+	__cancelImageJobs();
 	// The copies shown by the image viewer.
 	char *sharedPath = app_get_shared_data_path();
 	if (sharedPath) {
@@ -217,13 +216,5 @@ bool MemoEditView::insertTextToTitle(const char *text)
 		item->insertText(text);
 	else
 		MEMO_LOGE("no title item to take the text");
-	return true;
-}
-
-bool MemoEditView::insertImage(const char *path)
-{
-	// Pictures handed in by a launch request are copied and shrunk by the image flows, which are not part
-	// of this page yet.
-	MEMO_LOGI("image %s not inserted: image flows are not available", path ? path : "(null)");
 	return true;
 }

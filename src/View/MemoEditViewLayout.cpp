@@ -281,8 +281,7 @@ void MemoEditView::__onBoxSignal(const char *signal, void *data)
 			    },
 			    nullptr, getEvasObj());
 	} else if (!strcmp(signal, "action,image,selected")) {
-		// The image viewer comes with the image flows.
-		MEMO_LOGI("image selected: %s", data ? static_cast<const char *>(data) : "(null)");
+		__onImageSelected(static_cast<const char *>(data));
 	} else if (!strcmp(signal, "action,imagepopup,show")) {
 		__showProcessingPopup();
 	} else if (!strcmp(signal, "action,imagepopup,hide")) {

@@ -1,4 +1,4 @@
-// The edit view's side of the voice panels and the attach panel. The recorder and the player are not part of
+// The edit view's side of the voice panels. The recorder and the player are not part of
 // the app yet: their fields stay null, and these helpers say where they would come in.
 #include "View/MemoEditView.h"
 
@@ -100,11 +100,8 @@ char *MemoEditView::__getVrPathN(const char *uuid)
 	return strdup(found.c_str());
 }
 
-void MemoEditView::__destroyAttachPanel()
+void MemoEditView::__audioBtnCb()
 {
-	if (!__attachPanel) {
-		MEMO_LOGI("attachPanel is NULL");
-		return;
-	}
-	__attachPanel = nullptr;
+	// The recorder's panel opens here once the recorder is part of the app.
+	MEMO_LOGI("no recorder to open");
 }

@@ -1,8 +1,12 @@
 /* A small app for the launch tests. Each request it gets is written to "$TEST_CALLEE_DIR/<app id>.log":
-   "request first=<0|1> op=<operation> caller=<id>", then "extra <key>=<value>" (arrays "a,b"), then "end".
+   "request first=<0|1> op=<operation>", "caller=<id>", "uri=<uri>" and "mime=<type>" when set, then
+   "extra <key>=<value>" (arrays "a,b"), then "end".
    The request's extra data steer it: "reply" = succeeded|failed answers with the request's extra data
    plus "echo"="<app id>"; "die" = 1 ends the process at once without answering; "quit" = 1 ends it
-   normally. Events are logged too ("pause", "resume", "terminate"). */
+   normally. Events are logged too ("pause", "resume", "terminate").
+   Requests whose extra data the test cannot choose are answered from "$TEST_CALLEE_DIR/<app id>.reply" when
+   it exists: its first line is the result ("succeeded" or "canceled"), the lines after it the paths of the
+   array ".../data/selected"; the request's extra data go back too. */
 #include <Elementary.h>
 #include <app.h>
 
@@ -13,14 +17,20 @@
 
 static int requests_seen;
 
-static void log_line(const char *fmt, const char *a, const char *b)
+/* "$TEST_CALLEE_DIR/<app id><suffix>" */
+static void callee_path(char *path, size_t size, const char *suffix)
 {
 	const char *dir = getenv("TEST_CALLEE_DIR");
 	char *id = NULL;
 	app_get_id(&id);
-	char path[4096];
-	snprintf(path, sizeof(path), "%s/%s.log", dir ? dir : "/tmp", id ? id : "unknown");
+	snprintf(path, size, "%s/%s%s", dir ? dir : "/tmp", id ? id : "unknown", suffix);
 	free(id);
+}
+
+static void log_line(const char *fmt, const char *a, const char *b)
+{
+	char path[4096];
+	callee_path(path, sizeof(path), ".log");
 	FILE *f = fopen(path, "a");
 	if (!f)
 		return;
@@ -86,11 +96,13 @@ static bool extra_is(app_control_h request, const char *key, const char *expecte
 	return match;
 }
 
-static void answer(app_control_h request, app_control_result_e result)
+static void answer(app_control_h request, app_control_result_e result, const char **selected, int count)
 {
 	app_control_h reply = NULL;
 	app_control_create(&reply);
 	app_control_foreach_extra_data(request, copy_extra_cb, reply);
+	if (count > 0)
+		app_control_add_extra_data_array(reply, APP_CONTROL_DATA_SELECTED, selected, count);
 	char *id = NULL;
 	app_get_id(&id);
 	app_control_add_extra_data(reply, "echo", id);
@@ -100,6 +112,26 @@ static void answer(app_control_h request, app_control_result_e result)
 	snprintf(code, sizeof(code), "%d", ret);
 	log_line("replied %s%s", code, NULL);
 	app_control_destroy(reply);
+}
+
+static void answer_from_file(app_control_h request)
+{
+	char path[4096], line[4096];
+	callee_path(path, sizeof(path), ".reply");
+	FILE *f = fopen(path, "r");
+	if (!f)
+		return;
+	bool canceled = fgets(line, sizeof(line), f) && !strncmp(line, "canceled", 8);
+	char *selected[16];
+	int n = 0;
+	while (n < 16 && fgets(line, sizeof(line), f)) {
+		line[strcspn(line, "\n")] = '\0';
+		selected[n++] = strdup(line);
+	}
+	fclose(f);
+	answer(request, canceled ? APP_CONTROL_RESULT_CANCELED : APP_CONTROL_RESULT_SUCCEEDED, (const char **)selected, n);
+	while (n > 0)
+		free(selected[--n]);
 }
 
 static void request_cb(app_control_h request, void *user_data)
@@ -112,6 +144,13 @@ static void request_cb(app_control_h request, void *user_data)
 	snprintf(head, sizeof(head), "request first=%d", requests_seen++ == 0);
 	log_line("%s op=%s", head, op);
 	log_line("caller=%s%s", caller ? caller : "-", NULL);
+	char *uri = NULL, *mime = NULL;
+	if (app_control_get_uri(request, &uri) == APP_CONTROL_ERROR_NONE && uri)
+		log_line("uri=%s%s", uri, NULL);
+	if (app_control_get_mime(request, &mime) == APP_CONTROL_ERROR_NONE && mime)
+		log_line("mime=%s%s", mime, NULL);
+	free(uri);
+	free(mime);
 	free(op);
 	free(caller);
 	app_control_foreach_extra_data(request, log_extra_cb, NULL);
@@ -120,9 +159,11 @@ static void request_cb(app_control_h request, void *user_data)
 	if (extra_is(request, "die", "1"))
 		_exit(3);
 	if (extra_is(request, "reply", "succeeded"))
-		answer(request, APP_CONTROL_RESULT_SUCCEEDED);
+		answer(request, APP_CONTROL_RESULT_SUCCEEDED, NULL, 0);
 	else if (extra_is(request, "reply", "failed"))
-		answer(request, APP_CONTROL_RESULT_FAILED);
+		answer(request, APP_CONTROL_RESULT_FAILED, NULL, 0);
+	else
+		answer_from_file(request);
 	if (extra_is(request, "quit", "1"))
 		ui_app_exit();
 }

@@ -98,22 +98,43 @@ static void __showToast(Evas_Object *win, const char *message)
 	__current = popup;
 }
 
+static void __postOnMainLoop(const char *message);
+
+static void __postAsyncCb(void *data)
+{
+	__postOnMainLoop(data);
+	free(data);
+}
+
 int notification_status_message_post(const char *message)
 {
 	if (!message) {
 		LOGE("message is NULL");
 		return NOTIFICATION_ERROR_INVALID_PARAMETER;
 	}
+	if (eina_main_loop_is()) {
+		__postOnMainLoop(message);
+		return NOTIFICATION_ERROR_NONE;
+	}
+	/* Posted from a worker: the toast is made on the main loop, as the device's service would show it. */
+	char *copy = strdup(message);
+	if (!copy)
+		return NOTIFICATION_ERROR_OUT_OF_MEMORY;
+	ecore_main_loop_thread_safe_call_async(__postAsyncCb, copy);
+	return NOTIFICATION_ERROR_NONE;
+}
+
+static void __postOnMainLoop(const char *message)
+{
 	LOGI("toast: %s", message);
 	__logMessage(message);
 
 	Evas_Object *win = __findWindow();
 	if (!win) {
 		LOGI("no window to show the toast in");
-		return NOTIFICATION_ERROR_NONE;
+		return;
 	}
 	__showToast(win, message);
-	return NOTIFICATION_ERROR_NONE;
 }
 
 int desktop_toast_log_count(void)

@@ -1,0 +1,138 @@
+#ifndef TESTS_UI_SUPPORT_EDITVIEWAPPSFIXTURE_H
+#define TESTS_UI_SUPPORT_EDITVIEWAPPSFIXTURE_H
+
+// The edit view with its more menu, and the apps it launches played by the test callee
+// (tests/helpers/test_callee), registered under their ids in a private launch registry.
+
+#include <app_control.h>
+#include <app_manager.h>
+#include <vconf.h>
+
+#include <fstream>
+#include <set>
+#include <string>
+#include <vector>
+
+#include <WMenuPopupController.h>
+
+#include "EditViewFixture.h"
+#include "TestEnv.h"
+
+// What only shows for a moment, and what no user action starts.
+struct MemoEditViewTestAccess {
+	static bool isProcessing(MemoEditView *view) { return view->__processingPopup != nullptr; }
+	static void createAttachPanel(MemoEditView *view) { view->__createAttachPanel(); }
+	static bool isAttachPanelOpened(MemoEditView *view) { return view->__isAttachPanelOpened(); }
+};
+
+namespace memo_ui_test
+{
+
+class EditViewAppsFixture : public EditViewFixture
+{
+protected:
+	void SetUp() override
+	{
+		static const std::string apps = memo_test::makeTempDir("apps"), logs = memo_test::makeTempDir("callees");
+		appsDir = apps;
+		logDir = logs;
+		setenv("TIZEN_APPS_DIR", appsDir.c_str(), 1);
+		setenv("TEST_CALLEE_DIR", logDir.c_str(), 1);
+		EditViewFixture::SetUp();
+	}
+
+	void TearDown() override
+	{
+		// Callees end first: requests still waiting on them are answered as cancelled.
+		for (const std::string &id : registered) {
+			app_control_h h = nullptr;
+			app_control_create(&h);
+			app_control_set_app_id(h, id.c_str());
+			if (app_control_send_terminate_request(h) == APP_CONTROL_ERROR_NONE)
+				waitFor(
+				    [&] {
+					    bool running = false;
+					    app_manager_is_running(id.c_str(), &running);
+					    return !running;
+				    },
+				    10.0);
+			app_control_destroy(h);
+			unlink((logDir + "/" + id + ".log").c_str());
+			unlink((logDir + "/" + id + ".reply").c_str());
+		}
+		vconf_set_int("db/setting/psmode", 0);
+		EditViewFixture::TearDown();
+	}
+
+	// Registers the callee as `id`, taking `operations` (comma separated) when a request names no app.
+	void registerApp(const std::string &id, const std::string &operations = "", const std::string &icon = "")
+	{
+		std::ofstream(appsDir + "/" + id + ".ini") << "[app]\nid=" << id << "\nexec="
+		                                           << memo_test::helperPath("test_callee") << "\noperation="
+		                                           << operations << "\nicon=" << icon << "\n";
+		registered.insert(id);
+	}
+	// The answer of the callee `id` to every request from now on (see test_callee.c).
+	void setReply(const std::string &id, const std::string &lines)
+	{
+		std::ofstream(logDir + "/" + id + ".reply") << lines;
+	}
+	std::string calleeLog(const std::string &id) { return memo_test::readFile(logDir + "/" + id + ".log"); }
+	bool waitLog(const std::string &id, const std::string &text, size_t times = 1)
+	{
+		return waitFor([&] { return memo_test::countOf(calleeLog(id), text) >= times; }, 10.0);
+	}
+
+	// Opens the more menu by its key and gives the texts of its rows; empty when no menu opened.
+	std::vector<std::string> openMenu()
+	{
+		pressKey("F2");
+		settle(0.3);
+		std::vector<std::string> texts;
+		for (Elm_Object_Item *item : menuItems())
+			texts.push_back(elm_object_item_text_get(item));
+		return texts;
+	}
+	// Taps the row of the open menu that reads `text`.
+	void chooseMenu(const std::string &text)
+	{
+		for (Elm_Object_Item *item : menuItems()) {
+			if (text == elm_object_item_text_get(item)) {
+				tapItem(item);
+				settle(0.3);
+				return;
+			}
+		}
+		FAIL() << "no menu row " << text;
+	}
+	// Taps a widget item where it shows (the item may go with the tap).
+	void tapItem(Elm_Object_Item *item)
+	{
+		int x = 0, y = 0;
+		centreOf(elm_object_item_track(item), &x, &y);
+		elm_object_item_untrack(item);
+		tap(x, y);
+	}
+
+	std::string appsDir, logDir;
+	std::set<std::string> registered;
+
+private:
+	std::vector<Elm_Object_Item *> menuItems()
+	{
+		app_assist::WViewController *top = naviframe->getTopContentViewController();
+		app_assist::WViewController *menu = top ? top->getPopup() : nullptr;
+		std::vector<Elm_Object_Item *> items;
+		if (!dynamic_cast<app_assist::WMenuPopupController *>(menu))
+			return items;
+		const Eina_List *l = nullptr;
+		void *data = nullptr;
+		EINA_LIST_FOREACH(elm_list_items_get(elm_object_content_get(menu->getEvasObj())), l, data)
+		items.push_back(static_cast<Elm_Object_Item *>(data));
+		return items;
+	}
+};
+
+} // namespace memo_ui_test
+
+#endif
