@@ -34,7 +34,7 @@ TEST(LaunchRoutingTest, EachRequestShowsAndFillsItsPage)
 	    {SHARE_TEXT + TEXT + std::string(5000, 'x'), EDIT, "", "|" + std::string(4096, 'x')},
 	    {SHARE_TEXT + TEXT + std::string(4096, 'x'), EDIT, "", "|" + std::string(4096, 'x')},
 	    {SHARE + "-m text/plain -u 'file://" + dir + "/notes.md'", EDIT, "", "|first\nsecond & last"},
-	    {SHARE + "-u 'file://" + dir + "/Shot.PNG'", EDIT, "image " + dir + "/Shot.PNG", ""},
+	    {SHARE + "-u 'file://" + dir + "/Shot.PNG'", EDIT, "", "|\n"}, // the picture alone
 	    {SHARE + "-u file:///no/file", EDIT, "File open failed.", ""},
 	    {SHARE + "-u abc", EDIT, "not a file URI", ""},
 	    {"-o widget_new", EDIT, "", ""},

@@ -80,8 +80,8 @@ protected:
 		char text[200];
 		snprintf(text, sizeof(text), i18n_get_text(id), 10);
 		int n = 0;
-		for (int i = 0; i < toastCount(); i++)
-			n += toastAt(i) == text;
+		for (int i = 0; i < desktop_toast_log_count(); i++)
+			n += desktop_toast_log_get(i) && !strcmp(text, desktop_toast_log_get(i));
 		return n;
 	}
 
@@ -104,7 +104,6 @@ TEST_F(EditViewImages, GalleryAndCameraLaunchOnceAndTheirPicturesComeInAtOnceOrT
 	std::vector<Evas_Object *> cells = openInsertPopup();
 	ASSERT_EQ(2u, cells.size());
 	EXPECT_NE(nullptr, elm_object_part_content_get(cells[0], "app_icon"));
-	EXPECT_EQ(nullptr, elm_object_part_content_get(cells[1], "app_icon"));
 	tapObject(cells[0]);
 	tapObject(cells[0]);
 	ASSERT_TRUE(waitLog("tizen.gallery", "replied"));
@@ -130,6 +129,8 @@ TEST_F(EditViewImages, GalleryAndCameraLaunchOnceAndTheirPicturesComeInAtOnceOrT
 	setReply("test.camera", "succeeded\n" + large + "\n");
 	ASSERT_TRUE(waitFor([] { return !MemoPopupMonitor::getInstance()->isPopupAlive(); }, 1.5));
 	tapObject(openInsertPopup().at(1));
+	ASSERT_TRUE(waitFor([] { return desktop_app_chooser_current_get() != nullptr; }, 2.0));
+	pickInChooser("test.camera");
 	ASSERT_TRUE(waitFor([&] { return MemoEditViewTestAccess::isProcessing(view); }, 10.0));
 	ASSERT_TRUE(waitFor([&] { return !MemoEditViewTestAccess::isProcessing(view); }, 10.0));
 	log = calleeLog("test.camera");
@@ -152,12 +153,12 @@ TEST_F(EditViewImages, TheTenthPictureShowsTheLimitAtOnceAndRefusedOrDotlessPict
 	for (int i = 0; i < 9; i++) {
 		const std::string path = folder + "picture" + std::to_string(i) + ".jpg";
 		ASSERT_TRUE(writePicture(path, 200, 150));
-		tags += escapedTag(200, 150, path);
+		tags += tag(200, 150, path);
 	}
 	MemoEditView *view = openRecord(storedMemo("", todoList(todoItem(0, false, "nine" + tags)), uuid));
 	free(uuid);
 	pressUnderText(view, 0, 0);
-	clearToasts();
+	desktop_toast_log_clear();
 	EXPECT_TRUE(view->insertImage(picture("tenth.jpg", 200, 150).c_str()));
 	EXPECT_EQ(10u, memo_test::countOf(body(view), "<item"));
 	EXPECT_EQ(1, toasts("IDS_MEMO_TPOP_CANT_INSERT_MORE_THAN_PD_IMAGES"));
@@ -166,7 +167,7 @@ TEST_F(EditViewImages, TheTenthPictureShowsTheLimitAtOnceAndRefusedOrDotlessPict
 
 	// A picture the app refuses is not copied.
 	MemoEditView *fresh = openNew();
-	clearToasts();
+	desktop_toast_log_clear();
 	fresh->insertImage(refused().c_str());
 	EXPECT_EQ(1, toasts("IDS_MEMO_TPOP_RESOLUTION_NOT_SUPPORTED_BY_MEMO"));
 	EXPECT_EQ(std::string::npos, body(fresh).find("<item"));
@@ -192,8 +193,7 @@ TEST_F(EditViewImages, ViewerDeleteInAnEditTakesThePictureOutAndTheFileGoesAtDon
 	const std::string path = mediaDir(uuid) + "shown.jpg";
 	ecore_file_mkpath(mediaDir(uuid).c_str());
 	ASSERT_TRUE(writePicture(path, 600, 450));
-	MemoEditView *view =
-	    openRecord(storedMemo("", todoList(todoItem(0, false, "a" + escapedTag(600, 450, path))), uuid));
+	MemoEditView *view = openRecord(storedMemo("", todoList(todoItem(0, false, "a" + tag(600, 450, path))), uuid));
 	free(uuid);
 	pressUnderText(view, 0, 0);
 	ASSERT_NE(std::string::npos, body(view).find("<item"));
@@ -218,7 +218,7 @@ TEST_F(EditViewImages, AttachPanelPicksAreCopiedShrunkAndInsertedTogether)
 	typeInto(items(view)[1], "x");
 	const std::string picks = picture("small.jpg", 400, 300) + ":" + refused() + ":" + picture("large.png", 1200, 900);
 	setenv("TIZEN_ATTACH_PANEL_AUTOSELECT", picks.c_str(), 1);
-	clearToasts();
+	desktop_toast_log_clear();
 	MemoEditViewTestAccess::createAttachPanel(view);
 	EXPECT_TRUE(MemoEditViewTestAccess::isAttachPanelOpened(view));
 	ASSERT_TRUE(waitFor([&] { return memo_test::countOf(body(view), "<item") == 2; }, 10.0));

@@ -101,7 +101,7 @@ TEST_F(EditViewMenu, ShareSendsTextWithThePathsOrTheFilesAlone)
 		ecore_file_mkpath(mediaDir(uuid.c_str()).c_str());
 		EXPECT_TRUE(writePicture(picture, 200, 150));
 		MemoDocInfo *record =
-		    storedMemo(title, todoList(lines + todoItem(0, false, escapedTag(200, 150, picture))), uuid.c_str());
+		    storedMemo(title, todoList(lines + todoItem(0, false, tag(200, 150, picture))), uuid.c_str());
 		MemoFileInfo file;
 		file.setFileUUID(name);
 		file.setMemoUUID(uuid.c_str());
@@ -122,6 +122,7 @@ TEST_F(EditViewMenu, ShareSendsTextWithThePathsOrTheFilesAlone)
 	openRecord(listed);
 	openMenu();
 	chooseMenu(i18n_get_text("IDS_MEMO_OPT_SHARE"));
+	pickInChooser("test.share");
 	ASSERT_TRUE(waitLog("test.share", "end\n"));
 	std::string log = calleeLog("test.share");
 	EXPECT_NE(std::string::npos, log.find(std::string("op=") + SHARE_TEXT + "\n")) << log;
@@ -134,6 +135,7 @@ TEST_F(EditViewMenu, ShareSendsTextWithThePathsOrTheFilesAlone)
 	openRecord(alone);
 	openMenu();
 	chooseMenu(i18n_get_text("IDS_MEMO_OPT_SHARE"));
+	pickInChooser("test.share");
 	ASSERT_TRUE(waitLog("test.share", "end\n", 2));
 	log = calleeLog("test.share");
 	log = log.substr(log.find("end\n") + 4);

@@ -4,6 +4,7 @@
 // The edit view with its more menu, and the apps it launches played by the test callee
 // (tests/helpers/test_callee), registered under their ids in a private launch registry.
 
+#include <desktop/app_chooser.h>
 #include <app_control.h>
 #include <app_manager.h>
 #include <vconf.h>
@@ -67,9 +68,9 @@ protected:
 	// Registers the callee as `id`, taking `operations` (comma separated) when a request names no app.
 	void registerApp(const std::string &id, const std::string &operations = "", const std::string &icon = "")
 	{
-		std::ofstream(appsDir + "/" + id + ".ini") << "[app]\nid=" << id << "\nexec="
-		                                           << memo_test::helperPath("test_callee") << "\noperation="
-		                                           << operations << "\nicon=" << icon << "\n";
+		std::ofstream(appsDir + "/" + id + ".ini")
+		    << "[app]\nid=" << id << "\nexec=" << memo_test::helperPath("test_callee") << "\noperation=" << operations
+		    << "\nicon=" << icon << "\n";
 		registered.insert(id);
 	}
 	// The answer of the callee `id` to every request from now on (see test_callee.c).
@@ -132,6 +133,19 @@ private:
 		return items;
 	}
 };
+
+// The build's registry holds real apps too (the companions, the memo app itself): when a chooser comes
+// up for a request without an app id, the test's app is picked in it.
+inline void pickInChooser(const char *appId)
+{
+	Evas_Object *win = desktop_app_chooser_current_get();
+	Evas_Object *list = win ? evas_object_name_find(evas_object_evas_get(win), DESKTOP_APP_CHOOSER_LIST_NAME) : nullptr;
+	for (Elm_Object_Item *it = list ? elm_list_first_item_get(list) : nullptr; it; it = elm_list_item_next(it)) {
+		const char *id = static_cast<const char *>(elm_object_item_data_get(it));
+		if (id && !strcmp(id, appId))
+			elm_list_item_selected_set(it, EINA_TRUE);
+	}
+}
 
 } // namespace memo_ui_test
 
