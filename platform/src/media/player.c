@@ -165,7 +165,8 @@ int player_set_uri(player_h player, const char *uri)
 static player_error_e __prepare_error(GstElement *playbin)
 {
 	GstBus *bus = gst_element_get_bus(playbin);
-	GstMessage *m = gst_bus_pop_filtered(bus, GST_MESSAGE_ERROR);
+	/* The streaming thread may post its error just after the state change has failed. */
+	GstMessage *m = gst_bus_timed_pop_filtered(bus, GST_SECOND, GST_MESSAGE_ERROR);
 	gst_object_unref(bus);
 	if (!m) {
 		LOGE("the file did not get ready in time");
