@@ -17,13 +17,13 @@
 #include "MemoLog.h"
 #include "Model/MemoPopupMonitor.h"
 #include "Util/MemoUtil.h"
+#include "View/MemoStorageFull.h"
 
 using app_assist::WPopupController;
 using app_assist::WUiTimer;
 
 // Leaving waits this long after a tap, so that its feedback is seen first.
 static const double POP_DELAY = 0.1;
-static const char *const STORAGE_SETTINGS_APP_ID = "com.veltron.setting.storage";
 
 namespace
 {
@@ -150,44 +150,17 @@ void MemoEditView::__discard()
 
 void MemoEditView::__createStorageFullPopup()
 {
-	if (MemoUtil::isPowerSavingMode()) {
-		notification_status_message_post(i18n_get_text("IDS_ST_TPOP_NOT_ENOUGH_SPACE_IN_PHONE_STORAGE"));
+	WPopupController *popup = memoStorageFullPopupN([this] { __focusEntry(false); });
+	if (!popup)
 		return;
-	}
-	WPopupController *popup = new WPopupController();
-	popup->setTextTranslatable("memo");
-	popup->setTitle("IDS_IDLE_HEADER_NOT_ENOUGH_SPACE_ABB2");
-	popup->setContent("IDS_IDLE_POP_YOUR_DEVICE_STORAGE_DOESNT_HAVE_ENOUGH_SPACE_GO_TO_SETTINGS_STORAGE_AND_RAM_"
-	                  "STORAGE_DETAILS_THEN_DELETE_SOME_FILES_AND_TRY_AGAIN");
-	popup->addButton("IDS_MEMO_BUTTON_CANCEL", [this](bool *close) {
-		*close = true;
-		__focusEntry(false);
-	});
-	popup->addButton("IDS_MEMO_OPT_SETTINGS", [](bool *close) {
-		*close = true;
-		__launchStorageSettings();
-	});
 	styleQuestion(popup, "memo_popup/confirm");
 	MemoPopupMonitor::getInstance()->addPopup(popup);
 	attachPopup(popup);
 }
 
-// Each step runs even when the one before it failed; every failure has its line.
 void MemoEditView::__launchStorageSettings()
 {
-	app_control_h request = nullptr;
-	if (app_control_create(&request) != APP_CONTROL_ERROR_NONE)
-		MEMO_LOGE("Error app_control_create()");
-	if (app_control_set_launch_mode(request, APP_CONTROL_LAUNCH_MODE_GROUP) != APP_CONTROL_ERROR_NONE)
-		MEMO_LOGE("Error app_control_set_launch_mode()");
-	if (app_control_set_app_id(request, STORAGE_SETTINGS_APP_ID) != APP_CONTROL_ERROR_NONE)
-		MEMO_LOGE("Error app_control_set_app_id()");
-	if (app_control_add_extra_data(request, "viewtype", "storage_detail") != APP_CONTROL_ERROR_NONE)
-		MEMO_LOGE("Error app_control_add_extra_data()");
-	if (app_control_send_launch_request(request, nullptr, nullptr) != APP_CONTROL_ERROR_NONE)
-		MEMO_LOGE("Error app_control_send_launch_request()");
-	if (request)
-		app_control_destroy(request);
+	memoLaunchStorageSettings();
 }
 
 void MemoEditView::__createDeletePopup()
