@@ -15,6 +15,7 @@
 
 class MemoDocInfo;
 class MemoFileInfo;
+struct MemoEditViewImageJob;
 class MemoPlayer;
 class MemoRecorder;
 
@@ -172,6 +173,9 @@ private:
 	void __startImageJob();
 	static void __imgProcessThreadStartCb(void *data, Ecore_Thread *thread);
 	static void __imgProcessThreadEndCb(void *data, Ecore_Thread *thread);
+	// A picture worker has ended: its view with the job out of its books, the keypad back and the processing
+	// popup gone; null when the view has gone (the job is then freed).
+	static MemoEditView *__endImageJob(MemoEditViewImageJob *job);
 	static void __imgProcessThreadCancelCb(void *data, Ecore_Thread *thread);
 	void __afterPicturesIn();
 	// Cuts the workers loose: they end without the view.

@@ -182,19 +182,11 @@ void MemoEditView::__attachPanelThreadEndCb(void *data, Ecore_Thread *thread)
 {
 	(void)thread;
 	MemoEditViewImageJob *job = static_cast<MemoEditViewImageJob *>(data);
-	MemoEditView *self = job ? job->view : nullptr;
+	MemoEditView *self = __endImageJob(job);
 	if (!self) {
 		MEMO_LOGE("self is NULL");
-		delete job;
 		return;
 	}
-	self->__imageJobs = eina_list_remove(self->__imageJobs, job);
-	if (self->__threadHandle == job->thread)
-		self->__threadHandle = nullptr;
-	if (self->__boxControl)
-		self->__boxControl->resumeKeypad();
-	if (self->__processingPopup)
-		evas_object_del(self->__processingPopup);
 	void *path = nullptr;
 	EINA_LIST_FREE(self->__attachedPaths, path)
 	free(path);

@@ -339,14 +339,12 @@ void MemoEditView::__imgProcessThreadStartCb(void *data, Ecore_Thread *thread)
 	memoEditViewShrinkPicture(job->path, job->width, job->height, job->scale);
 }
 
-void MemoEditView::__imgProcessThreadEndCb(void *data, Ecore_Thread *thread)
+MemoEditView *MemoEditView::__endImageJob(MemoEditViewImageJob *job)
 {
-	(void)thread;
-	MemoEditViewImageJob *job = static_cast<MemoEditViewImageJob *>(data);
 	MemoEditView *self = job ? job->view : nullptr;
 	if (!self) {
 		delete job;
-		return;
+		return nullptr;
 	}
 	self->__imageJobs = eina_list_remove(self->__imageJobs, job);
 	if (self->__threadHandle == job->thread)
@@ -355,6 +353,16 @@ void MemoEditView::__imgProcessThreadEndCb(void *data, Ecore_Thread *thread)
 		self->__boxControl->resumeKeypad();
 	if (self->__processingPopup)
 		evas_object_del(self->__processingPopup);
+	return self;
+}
+
+void MemoEditView::__imgProcessThreadEndCb(void *data, Ecore_Thread *thread)
+{
+	(void)thread;
+	MemoEditViewImageJob *job = static_cast<MemoEditViewImageJob *>(data);
+	MemoEditView *self = __endImageJob(job);
+	if (!self)
+		return;
 	if (self->__boxControl)
 		self->__boxControl->insertImage(job->path.c_str());
 	free(self->__imagePath);
