@@ -93,6 +93,8 @@ Evas_Object *MemoHiddenPasswordView::onCreateView(Evas_Object *parent, void *par
 
 	Evas_Object *button = elm_button_add(__layout);
 	elm_object_style_set(button, "bottom");
+	// Every key is a character of the PIN: none may press this button.
+	elm_object_focus_allow_set(button, EINA_FALSE);
 	elm_object_domain_translatable_text_set(button, "memo-sub", "IDS_MEMO_BUTTON_FORGOTTEN_PIN_ABB");
 	evas_object_smart_callback_add(button, "clicked", __forgottenPinCb, this);
 	elm_object_part_content_set(__layout, "bottom", button);
@@ -183,8 +185,12 @@ void MemoHiddenPasswordView::__onKey(const char *keyName)
 		__index = previous;
 		return;
 	}
-	if (!__isCreateMode && __showLock())
+	if (!__isCreateMode && __showLock()) {
+		// The entry took the key as typed text before this handler saw it.
+		if (__index >= 0 && __index < PIN_LENGTH)
+			elm_object_text_set(__entries[__index], "");
 		return;
+	}
 	if (__index < 0 || __index >= PIN_LENGTH)
 		__index = 0;
 	// Any key counts, by the first letter of its name.
