@@ -240,7 +240,7 @@ static void request(app_control_h request)
 static bool test_ready(void)
 {
 	const char *text = getenv(TEST_TYPE_ENV);
-	if (!text || !ui.entry)
+	if (!text || !ui.entry || elm_object_disabled_get(ui.entry))
 		return true;
 	if (ui.typed) {
 		char *now = elm_entry_markup_to_utf8(elm_entry_entry_get(ui.entry));
