@@ -24,7 +24,7 @@ void memoHiddenTitleSet(Elm_Object_Item *naviItem, const char *textId, Evas_Smar
 		return;
 	Evas_Object *naviframe = elm_object_item_widget_get(naviItem);
 	Evas_Object *button = elm_button_add(naviframe);
-	elm_object_style_set(button, "naviframe/back_btn/default");
+	elm_object_style_set(button, "memo_back");
 	// Keys belong to the page: a focused back button would take Return or space as a tap.
 	elm_object_focus_allow_set(button, EINA_FALSE);
 	evas_object_smart_callback_add(button, "clicked", backCb, data);
