@@ -20,6 +20,11 @@
 
 namespace
 {
+#ifdef __SANITIZE_ADDRESS__
+const int SHORT_RUN = 40; // the sanitizer build starts the app several times slower
+#else
+const int SHORT_RUN = 100;
+#endif
 const std::string OP = "-o http://tizen.org/appcontrol/operation/";
 const std::string TEXT = " -d http://tizen.org/appcontrol/data/text ";
 
@@ -53,7 +58,7 @@ std::string bodyAndFiles(const memo_test::MemoLaunch &app, const std::string &uu
 
 TEST(CrashSafety, KilledAtRandomTheStoreKeepsEveryAcknowledgedWrite)
 {
-	const int total = getenv("MEMO_LONG") ? 1000 : 100;
+	const int total = getenv("MEMO_LONG") ? 1000 : SHORT_RUN;
 	const char *seedText = getenv("MEMO_CRASH_SEED"); // to replay a run
 	const unsigned seed = seedText ? static_cast<unsigned>(atol(seedText)) : static_cast<unsigned>(time(nullptr));
 	std::mt19937 random(seed);

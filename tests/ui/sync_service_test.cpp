@@ -91,7 +91,10 @@ TEST_F(SyncService, ASaveWaitsOutAShortSyncAndFailsPastTheBusyHandler)
 	ASSERT_TRUE(restore.finish());
 	pressDone(view);
 	ASSERT_TRUE(waitFor([this] { return lastPagePopped; }));
-	EXPECT_EQ("1", query("SELECT count(*) FROM memo WHERE content = 'locked out'"));
+	const int lost = (query("SELECT count(*) FROM memo WHERE content = 'locked out'") != "1") +
+	                 (query("SELECT count(*) FROM memo WHERE content = 'after the backup'") != "1");
+	printf("sync lock waits: 2 (a 2 s lock waited out, a 15 s lock refused with the text kept), lost=%d\n", lost);
+	EXPECT_EQ(0, lost);
 }
 
 TEST_F(SyncService, AServiceWritingAllAlongAndAPersonEditingLoseNothing)
