@@ -9,6 +9,8 @@
 #include "DataBase/MemoDbMgr.h"
 #include "MemoLog.h"
 #include "Util/MemoUtil.h"
+#include "View/MemoSearchView.h"
+#include "View/MemoSelectionView.h"
 #include "View/MemoHiddenFirstAccess.h"
 #include "View/MemoHiddenPasswordView.h"
 #include "View/MemoSettingsView.h"
@@ -18,14 +20,25 @@ namespace
 const int HIDDEN_GESTURE_LIMIT = 76;
 } // namespace
 
+// The search serves the list's own pick request when asked to, so a tap there answers the requester.
 void MemoListView::__pushSearchView(bool servePick)
 {
-	MEMO_LOGI("Search chosen%s: no search view yet", servePick ? " to pick" : "");
+	app_assist::WNaviframeController *naviframe = getNaviframeController();
+	if (!naviframe)
+		return;
+	__hideFloatingButton();
+	__isTopView = false;
+	naviframe->push(new MemoSearchView(), nullptr, servePick ? &__pickRequest : nullptr);
 }
 
 void MemoListView::__pushSelectionView()
 {
-	MEMO_LOGI("Delete chosen: no selection view yet");
+	app_assist::WNaviframeController *naviframe = getNaviframeController();
+	if (!naviframe)
+		return;
+	__hideFloatingButton();
+	__isTopView = false;
+	naviframe->push(new MemoSelectionView(0));
 }
 
 void MemoListView::__pushHiddenView(bool hasPassword)
