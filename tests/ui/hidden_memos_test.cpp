@@ -10,6 +10,8 @@
 #include "View/MemoHiddenFirstAccess.h"
 #include "View/MemoHiddenView.h"
 #include "View/MemoListView.h"
+#include "View/MemoSearchView.h"
+#include "View/MemoSelectionView.h"
 #include "View/MemoSettingsView.h"
 
 using namespace memo_ui_test;
@@ -80,8 +82,7 @@ TEST_F(HiddenMemosTest, createThePinInTwoPassesFromTheListThenTheChoiceOfHiddenM
 	typePin("1234");
 	EXPECT_EQ(digestOf("1234"), storedPin());
 	// No memo is hidden yet: the choice of hidden memos follows.
-	EXPECT_TRUE(waitFor([this] { return logSince().find("MemoSelectionView (mode 1)") != std::string::npos; }));
-	EXPECT_EQ(nullptr, top<MemoHiddenPasswordView>());
+	EXPECT_NE(nullptr, waitTop<MemoSelectionView>());
 }
 
 TEST_F(HiddenMemosTest, wrongAndRightPinsTheForgottenPinButtonWithAnAccountAndAChangeOfPin)
@@ -106,6 +107,13 @@ TEST_F(HiddenMemosTest, wrongAndRightPinsTheForgottenPinButtonWithAnAccountAndAC
 	ASSERT_NE(nullptr, hidden);
 	EXPECT_EQ(0, MemoHiddenPinLock::getWrongCount());
 	EXPECT_EQ((std::vector<std::string>{"Edit Hidden Memo", "Delete", "Search", "Change PIN"}), openMenu());
+	chooseMenu("Search");
+	MemoSearchView *search = waitTop<MemoSearchView>();
+	ASSERT_NE(nullptr, search);
+	EXPECT_EQ(5, search->gridMode);
+	pressKey("Escape");
+	ASSERT_EQ(hidden, waitTop<MemoHiddenView>());
+	openMenu();
 
 	// The change: the old PIN, then a new one twice; any key counts by the first letter of its name.
 	chooseMenu("Change PIN");
