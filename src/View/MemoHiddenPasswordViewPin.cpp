@@ -96,7 +96,7 @@ void MemoHiddenPasswordView::__onWrongPin()
 			    elm_object_signal_emit(__layout, "show,button", "");
 		    return false;
 	    },
-	    nullptr, getEvasObj());
+	    nullptr, __layout);
 }
 
 bool MemoHiddenPasswordView::__storePin()
@@ -131,7 +131,7 @@ void MemoHiddenPasswordView::__afterPause(const char *textId)
 		    __clearEntries();
 		    return false;
 	    },
-	    nullptr, getEvasObj());
+	    nullptr, __layout);
 }
 
 void MemoHiddenPasswordView::resetPINView()
@@ -168,7 +168,7 @@ bool MemoHiddenPasswordView::__showLock()
 			    __setBarText("IDS_MEMO_HEADER_ENTER_PIN");
 			    return false;
 		    },
-		    nullptr, getEvasObj());
+		    nullptr, __layout);
 	}
 	return true;
 }
