@@ -144,6 +144,8 @@ char *app_channel_port_id_get(const char *app_id, const char *port);
 /* Listens on a message port's socket (non-blocking); -1 when another process listens there. */
 int app_channel_port_listen(const char *port_id);
 void app_channel_port_unlisten(const char *port_id, int fd);
+/* True when the process at the other end of a connected socket runs as this user; logs a refusal. */
+bool app_channel_peer_allowed(int fd);
 /* Pid of the process that owns app_id's launch socket, or -1. */
 pid_t app_channel_owner_pid(const char *app_id);
 /* Asks a running app to bring its windows to the front; APP_CONTROL_ERROR_* (APP_NOT_FOUND if not running). */
