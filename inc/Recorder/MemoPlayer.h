@@ -68,13 +68,15 @@ private:
 	bool __sendMessagePort();
 	static void __media_key_event_cb(media_key_e key, media_key_event_e status, void *data);
 	static void __playerInterruptedCb(player_interrupted_code_e code, void *data);
-	// The mini controllers keep playback controllable from outside the app; until they exist these only say
-	// where they come in.
+	// The mini controllers keep playback controllable from the notification panel and the lock screen while
+	// the app is in the background.
 	void __createMiniControllers();
 	void __destroyMiniControllers();
 	void __setMiniTime(const char *text, int ms);
 	void __refreshNotiMini();
 	void __refreshLockMini();
+	void __onNotiMiniEvent(const char *event);
+	void __onLockMiniEvent(const char *event);
 
 	bool __mediaKeyPressed;
 	player_h __player;

@@ -82,13 +82,15 @@ private:
 	bool __sendMessagePort();
 	static void __media_key_event_cb(media_key_e key, media_key_event_e status, void *data);
 	static void _soundActiveDeviceChangedCb(sound_device_in_e in, sound_device_out_e out, void *data);
-	// The mini controllers keep a take controllable from outside the app; until they exist these only say
-	// where they come in.
+	// The mini controllers keep a take controllable from the notification panel and the lock screen while
+	// the app is in the background.
 	void __createMiniControllers();
 	void __destroyMiniControllers();
 	void __setMiniTime(const char *text, unsigned long long ms);
 	void __refreshNotiMini();
 	void __refreshLockMini();
+	void __onNotiMiniEvent(const char *event);
+	void __onLockMiniEvent(const char *event);
 
 	recorder_h __recorder;
 	bool __mediaKeyPressed;
