@@ -6,11 +6,13 @@
 #include <player.h>
 
 #include <Elementary.h>
+#include <string>
 #include <WSignal.h>
 #include <WViewController.h>
 
 class MplayerNotiMiniController;
 class MPlayerLockScreenMiniController;
+class MemoMprisPlayer;
 
 // The panel that plays a memo's voice file: play and pause, a slider with the position and the length, and
 // in an edit a delete button that asks first. The owner swallows it in its layout's part "recorder_contents"
@@ -25,6 +27,8 @@ public:
 	// The file to play; copied.
 	explicit MemoPlayer(const char *filePath);
 	~MemoPlayer() override;
+	// The memo's title, which the desktop's media controls show while the file plays; copied.
+	void setMediaTitle(const char *title);
 
 protected:
 	// Any non-null `param` shows the panel for reading (no delete button); null gives the edit form. Null
@@ -100,6 +104,14 @@ private:
 	MplayerNotiMiniController *__notiMini;
 	MPlayerLockScreenMiniController *__lockMini;
 	bool __inBackground;
+
+	// ---- The desktop's media controls (MemoPlayerMpris.cpp) ----
+	// Published from the start of playback to its end.
+	void __startMpris();
+	void __stopMpris();
+	void __updateMpris();
+	MemoMprisPlayer *__mpris = nullptr;
+	std::string __mediaTitle;
 };
 
 #endif

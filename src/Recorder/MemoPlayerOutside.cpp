@@ -144,6 +144,7 @@ void MemoPlayer::__playerInterruptedCb(player_interrupted_code_e code, void *dat
 		self->__playerResume();
 		self->__updatePlayerLayout();
 	}
+	self->__updateMpris();
 	if (self->__notiMini) {
 		self->__refreshNotiMini();
 		self->__sendMessagePort();
