@@ -15,6 +15,7 @@
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
 #include "Model/MemoPopupMonitor.h"
+#include "Recorder/MemoMprisPlayer.h"
 #include "Recorder/MemoVoicePanel.h"
 #include "Util/MemoUtil.h"
 
@@ -43,6 +44,7 @@ MemoRecorder::~MemoRecorder()
 	free(__filePath);
 	sound_manager_unset_active_device_changed_cb();
 	__destroyMiniControllers();
+	__stopMpris();
 }
 
 Evas_Object *MemoRecorder::onCreateView(Evas_Object *parent, void *param)
@@ -124,6 +126,7 @@ void MemoRecorder::onDestroy()
 		}
 	}
 	__destroySession("onDestroy");
+	__stopMpris();
 	if (__callManager) {
 		cm_deinit(__callManager);
 		__callManager = nullptr;
@@ -187,6 +190,8 @@ void MemoRecorder::__showTime(unsigned long long ms)
 	memoVoiceFormatTime(static_cast<long long>(ms), text, sizeof(text));
 	elm_object_part_text_set(getEvasObj(), "recorder_time", text);
 	__setMiniTime(text, ms);
+	if (__mpris)
+		__mpris->setPosition(ms);
 }
 
 void MemoRecorder::__recorderCreateCb(void *data, Evas *evas, Evas_Object *obj, void *eventInfo)
@@ -228,6 +233,7 @@ void MemoRecorder::__onStartTimer()
 	__stopBtn = __takePartObject("recorder_stop_btn", recorderStopCb);
 	__pauseResumeBtn = __takePartObject("recorder_pause_resume_btn", __pauseResumeCb);
 	__updateRecorderLayout();
+	__startMpris();
 	__signal.emit("recorder,start", __fileUUID);
 }
 
@@ -251,6 +257,7 @@ void MemoRecorder::__pauseResumeCb(void *data, Evas *evas, Evas_Object *obj, voi
 			recorder_start(self->__recorder);
 	}
 	self->__updateRecorderLayout();
+	self->__updateMpris();
 	if (self->__notiMini) {
 		self->__sendMessagePort();
 		self->__refreshNotiMini();
