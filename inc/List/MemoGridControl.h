@@ -39,6 +39,8 @@ public:
 	void restoreScrollPosition();
 	// Number of rows of the last full update.
 	int getItemCount() const { return __itemCount; }
+	// The selection flags of the last full update, one int per row (1 ticked), owned by the control.
+	int *getCheckStates() { return __checkStates; }
 	// Emits "selected" with the tapped card, 0.1 s after the tap.
 	SelectedSignal &getSelectedSignal() { return __selectedSignal; }
 

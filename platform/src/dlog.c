@@ -1,8 +1,10 @@
 /* dlog on a desktop: each line to stderr and to <data path>/dlog.log, as "<P>/<TAG>(<pid>): <message>".
-   Error and fatal lines are written at once (with every line before them). Other lines logged on the main
-   loop's thread while the loop runs are gathered and written together when the loop goes idle, when the
-   buffer fills and at exit, so that a burst of lines costs two writes rather than two per line. The log file
-   stays open while the data path stays the same. */
+   Lines below fatal logged on the main thread while the main loop runs (in an app, from its create on) are
+   gathered and written together: when the loop goes idle (before the frame is drawn), when 64 KiB have
+   gathered, at exit, before a fatal line or a line of another thread (so the order stays), and from the
+   handler of a crash signal before the process dies. A burst of lines thus costs a few writes rather than two
+   per line; only a process killed outright loses the lines of its current loop iteration. The log file stays
+   open while the data path stays the same. */
 #define _GNU_SOURCE
 #include <dlog.h>
 
@@ -10,6 +12,7 @@
 #include <Eina.h>
 #include <fcntl.h>
 #include <pthread.h>
+#include <signal.h>
 #include <stdbool.h>
 #include <stdio.h>
 #include <stdlib.h>
@@ -18,9 +21,12 @@
 #include <time.h>
 #include <unistd.h>
 
+#include "dlog_private.h"
+
 char *app_get_data_path(void);
 
 #define LINE_MAX_BYTES 4352
+#define MESSAGE_MAX_BYTES 4096
 #define BUFFER_BYTES (64 * 1024)
 
 static const char PRIO_LETTERS[] = "??VDIWEFS";
@@ -36,12 +42,15 @@ static char *log_env[PATH_ENV_COUNT];
 static char buffer[BUFFER_BYTES];
 static size_t buffered;
 static Ecore_Idle_Enterer *flush_idler;
-static bool exit_hooked;
+static bool hooked;
+static bool gather_main;
 static time_t stamp_second = -1;
 static pid_t pid;
+static char pid_text[16];
 static char stamp_text[32];
+static int level; /* DLOG_LEVEL, read again with the environment once a second */
 
-static int min_level(void)
+static int read_level(void)
 {
 	const char *lvl = getenv("DLOG_LEVEL");
 	return lvl ? atoi(lvl) : 0;
@@ -126,11 +135,58 @@ static Eina_Bool flush_idle_cb(void *data)
 	return ECORE_CALLBACK_CANCEL;
 }
 
-static void flush_at_exit(void)
+void dlog_flush(void)
 {
 	pthread_mutex_lock(&log_lock);
 	flush_locked(NULL, 0);
 	pthread_mutex_unlock(&log_lock);
+}
+
+static void flush_at_exit(void)
+{
+	dlog_flush();
+}
+
+void dlog_gather_main_thread(bool on)
+{
+	pthread_mutex_lock(&log_lock);
+	gather_main = on;
+	if (!on) {
+		flush_locked(NULL, 0);
+		/* The loop may be shut down next, its idle enterers with it. */
+		if (flush_idler)
+			ecore_idle_enterer_del(flush_idler);
+		flush_idler = NULL;
+	}
+	pthread_mutex_unlock(&log_lock);
+}
+
+/* A crash writes what was gathered (write() alone: no lock, no allocation), then dies as it would have. */
+static const int CRASH_SIGNALS[] = {SIGSEGV, SIGBUS, SIGILL, SIGFPE, SIGABRT};
+
+static void crash_cb(int sig)
+{
+	const size_t len = buffered;
+	buffered = 0;
+	write_all(STDERR_FILENO, buffer, len);
+	write_all(log_fd, buffer, len);
+	raise(sig); /* SA_RESETHAND: the default action now */
+}
+
+/* Handlers others set (a debugger's, a sanitizer's) are left as they are. */
+static void hook_crash_signals(void)
+{
+	for (size_t i = 0; i < sizeof(CRASH_SIGNALS) / sizeof(CRASH_SIGNALS[0]); i++) {
+		struct sigaction old;
+		if (sigaction(CRASH_SIGNALS[i], NULL, &old) != 0 || (old.sa_flags & SA_SIGINFO) || old.sa_handler != SIG_DFL)
+			continue;
+		struct sigaction action;
+		memset(&action, 0, sizeof(action));
+		action.sa_handler = crash_cb;
+		action.sa_flags = SA_RESETHAND | SA_NODEFER;
+		sigemptyset(&action.sa_mask);
+		sigaction(CRASH_SIGNALS[i], &action, NULL);
+	}
 }
 
 /* A fork waits for a line in progress, so that the child's lock is free. The child keeps nothing of its
@@ -148,16 +204,17 @@ static void unlock_after_fork(void)
 static void forget_after_fork(void)
 {
 	pid = 0;
+	gather_main = false;
 	buffered = 0;
 	flush_idler = NULL;
 	pthread_mutex_unlock(&log_lock);
 }
 
-/* A line may wait for the loop to go idle only on the loop's own thread while the loop runs: nothing else
-   would come back to write it. */
+/* A line may wait only on the main thread while the loop runs or is about to: nothing else would come back
+   to write it. */
 static bool may_wait(int prio)
 {
-	return prio < DLOG_ERROR && !in_log && eina_main_loop_is() && ecore_main_loop_nested_get() > 0;
+	return prio < DLOG_FATAL && !in_log && eina_main_loop_is() && (gather_main || ecore_main_loop_nested_get() > 0);
 }
 
 static const char *stamp_of(const struct timeval *tv)
@@ -168,49 +225,149 @@ static const char *stamp_of(const struct timeval *tv)
 		strftime(stamp_text, sizeof(stamp_text), "%m-%d %H:%M:%S", &tm);
 		stamp_second = tv->tv_sec;
 		env_recheck = true;
+		level = read_level();
 	}
 	return stamp_text;
+}
+
+/* Appends at most the room left of out (cap bytes, at) and returns the new end. */
+static size_t put(char *out, size_t at, size_t cap, const char *text, size_t len)
+{
+	if (at + len > cap)
+		len = cap - at;
+	memcpy(out + at, text, len);
+	return at + len;
+}
+
+static size_t put_number(char *out, size_t at, size_t cap, long long value)
+{
+	char digits[24];
+	size_t n = sizeof(digits);
+	unsigned long long magnitude = value < 0 ? 0ULL - (unsigned long long)value : (unsigned long long)value;
+	do {
+		digits[--n] = (char)('0' + magnitude % 10);
+		magnitude /= 10;
+	} while (magnitude);
+	if (value < 0)
+		digits[--n] = '-';
+	return put(out, at, cap, digits + n, sizeof(digits) - n);
+}
+
+/* Formats with no other conversions than %s, %d, %i, %u, %c and %%: the app's lines. */
+static bool is_simple(const char *fmt)
+{
+	for (const char *p = strchr(fmt, '%'); p; p = strchr(p + 2, '%'))
+		if (!p[1] || !strchr("sdiuc%", p[1]))
+			return false;
+	return true;
+}
+
+/* The message as vsnprintf would give it, cut to cap - 1 bytes; returns its length. The app's simple formats
+   are done here, at a fraction of the cost. */
+static size_t format_message(char *out, size_t cap, const char *fmt, va_list ap)
+{
+	if (!is_simple(fmt)) {
+		int n = vsnprintf(out, cap, fmt, ap);
+		return n < 0 ? 0 : ((size_t)n >= cap ? cap - 1 : (size_t)n);
+	}
+	const size_t room = cap - 1;
+	size_t at = 0;
+	for (const char *p = fmt; *p;) {
+		const char *mark = strchrnul(p, '%');
+		at = put(out, at, room, p, (size_t)(mark - p));
+		if (!*mark)
+			break;
+		switch (mark[1]) {
+		case 's': {
+			const char *text = va_arg(ap, const char *);
+			if (!text)
+				text = "(null)";
+			at = put(out, at, room, text, strlen(text));
+			break;
+		}
+		case 'd':
+		case 'i':
+			at = put_number(out, at, room, va_arg(ap, int));
+			break;
+		case 'u':
+			at = put_number(out, at, room, va_arg(ap, unsigned int));
+			break;
+		case 'c': {
+			const char c = (char)va_arg(ap, int);
+			at = put(out, at, room, &c, 1);
+			break;
+		}
+		default:
+			at = put(out, at, room, "%", 1);
+			break;
+		}
+		p = mark + 2;
+	}
+	out[at] = '\0';
+	return at;
+}
+
+/* "MM-DD hh:mm:ss.mmm P/TAG(  pid): message\n" into out (LINE_MAX_BYTES); returns its length. Called with
+   the lock held. */
+static size_t format_line(char *out, const struct timeval *tv, int prio, const char *tag, const char *fmt, va_list ap)
+{
+	const size_t room = LINE_MAX_BYTES - 1; /* the line end always fits */
+	const char *stamp = stamp_of(tv);
+	size_t at = put(out, 0, room, stamp, strlen(stamp));
+	const long ms = (long)(tv->tv_usec / 1000);
+	const char head[] = {
+	    '.', (char)('0' + ms / 100), (char)('0' + ms / 10 % 10), (char)('0' + ms % 10), ' ', PRIO_LETTERS[prio], '/'};
+	at = put(out, at, room, head, sizeof(head));
+	if (tag)
+		at = put(out, at, room, tag, strnlen(tag, 64));
+	at = put(out, at, room, pid_text, strlen(pid_text));
+	size_t cap = room - at + 1;
+	if (cap > MESSAGE_MAX_BYTES)
+		cap = MESSAGE_MAX_BYTES;
+	at += format_message(out + at, cap, fmt, ap);
+	out[at++] = '\n';
+	return at;
 }
 
 int __dlog_vprint(log_id_t log_id, int prio, const char *tag, const char *fmt, va_list ap)
 {
 	if (!fmt || log_id < LOG_ID_MAIN || log_id >= LOG_ID_MAX || prio < DLOG_UNKNOWN || prio >= DLOG_PRIO_MAX)
 		return DLOG_ERROR_INVALID_PARAMETER;
-	if (prio < min_level() || prio == DLOG_SILENT)
+	if (prio == DLOG_SILENT)
 		return DLOG_ERROR_NONE;
-
-	char msg[4096];
-	vsnprintf(msg, sizeof(msg), fmt, ap);
 
 	struct timeval tv;
 	gettimeofday(&tv, NULL);
 
 	pthread_mutex_lock(&log_lock);
-	if (!pid)
+	if (!hooked) {
+		hooked = true;
+		level = read_level();
+		atexit(flush_at_exit);
+		pthread_atfork(lock_for_fork, unlock_after_fork, forget_after_fork);
+		hook_crash_signals();
+	}
+	if (!pid) {
 		pid = getpid();
-	char line[LINE_MAX_BYTES];
-	int len = snprintf(line, sizeof(line), "%s.%03ld %c/%s(%5d): %s\n", stamp_of(&tv), (long)(tv.tv_usec / 1000),
-	                   PRIO_LETTERS[prio], tag ? tag : "", (int)pid, msg);
-	if (len < 0) {
+		snprintf(pid_text, sizeof(pid_text), "(%5d): ", (int)pid);
+	}
+	stamp_of(&tv);
+	if (prio < level) {
 		pthread_mutex_unlock(&log_lock);
 		return DLOG_ERROR_NONE;
 	}
-	if (len >= (int)sizeof(line))
-		len = sizeof(line) - 1;
-	if (!exit_hooked) {
-		exit_hooked = true;
-		atexit(flush_at_exit);
-		pthread_atfork(lock_for_fork, unlock_after_fork, forget_after_fork);
-	}
 	if (!may_wait(prio)) {
-		flush_locked(line, (size_t)len);
+		char line[LINE_MAX_BYTES];
+		flush_locked(line, format_line(line, &tv, prio, tag, fmt, ap));
 	} else {
-		if (buffered + (size_t)len > sizeof(buffer))
+		if (sizeof(buffer) - buffered < LINE_MAX_BYTES)
 			flush_locked(NULL, 0);
-		memcpy(buffer + buffered, line, (size_t)len);
-		buffered += (size_t)len;
+		if (log_fd < 0) /* open for a crash to write to */
+			log_file(false);
+		buffered += format_line(buffer + buffered, &tv, prio, tag, fmt, ap);
+		/* Before the canvas's own: the lines of a step are written before its frame is drawn. */
 		if (!flush_idler)
-			flush_idler = ecore_idle_enterer_add(flush_idle_cb, NULL);
+			flush_idler = ecore_idle_enterer_before_add(flush_idle_cb, NULL);
 	}
 	pthread_mutex_unlock(&log_lock);
 	return DLOG_ERROR_NONE;

@@ -170,6 +170,9 @@ void MemoGridControl::searchGrid(const char *keyword, int *outCount)
 
 void MemoGridControl::reloadItems()
 {
+	// The cards point into the records that go here; a search that finds no row would keep them.
+	if (getEvasObj())
+		elm_gengrid_clear(getEvasObj());
 	delete __itemList;
 	__itemList = MemoDbMgr::getInstance()->getVisibleMemoListN();
 }

@@ -11,6 +11,7 @@
 
 #include "DataBase/MemoDbMgr.h"
 #include "DataBase/MemoDocInfo.h"
+#include "List/MemoItemList.h"
 #include "Model/MemoPopupMonitor.h"
 #include "TestEnv.h"
 #include "View/MemoEditView.h"
@@ -57,18 +58,36 @@ protected:
 		ASSERT_TRUE(waitFor([this] { return listView() != nullptr; }));
 		runFor(0.4);
 	}
-	// The editor came on top, on a new memo (empty uuid) or on the memo `uuid`; back returns to the list.
-	bool openedEditorOn(const std::string &uuid)
+	// The editor once it is on top and settled, else null.
+	MemoEditView *editorOnTop()
 	{
 		MemoEditView *editor = nullptr;
-		if (!waitFor(
-		        [&] { return (editor = dynamic_cast<MemoEditView *>(naviframe()->getTopContentViewController())); }))
-			return false;
+		waitFor([&] { return (editor = dynamic_cast<MemoEditView *>(naviframe()->getTopContentViewController())); });
 		runFor(0.3);
-		MemoDocInfo *info = editor->getCurrentDocInfo();
-		const bool right = uuid.empty() ? !info : info && uuid == info->getMemoUUID();
+		render();
+		return editor;
+	}
+	Evas_Object *doneButton(MemoEditView *editor)
+	{
+		return elm_object_item_part_content_get(editor->getNaviItem(), "title_right_btn");
+	}
+	// Taps the body item of a new memo (the one after the title) and types text into it.
+	void typeIntoBody(MemoEditView *editor, const char *text)
+	{
+		Evas_Object *scroller = elm_object_part_content_get(editor->getEvasObj(), "edit_view_contents");
+		Eina_List *items = elm_box_children_get(elm_object_content_get(scroller));
+		Evas_Object *body = static_cast<Evas_Object *>(eina_list_nth(items, 1));
+		eina_list_free(items);
+		ASSERT_NE(nullptr, body);
+		tapOn(elm_object_part_content_get(elm_object_part_content_get(body, "content"), "entry"));
+		typeText(text);
+		runFor(0.2);
+	}
+	void backToList()
+	{
 		pressKey("Escape");
-		return right && waitFor([this] { return listView() != nullptr; });
+		ASSERT_TRUE(waitFor([this] { return listView() != nullptr; }));
+		runFor(0.4);
 	}
 };
 
@@ -82,22 +101,41 @@ TEST_F(ListViewTest, emptyStoreShowsEmptyStateThenTheNewMemoAfterTheEditor)
 	ASSERT_NE(nullptr, floatingButton());
 	EXPECT_EQ(std::string("Memo"), elm_object_part_text_get(listView()->getEvasObj(), "naviframe.title"));
 
-	// The button starts a new memo; the memo saved there shows as the one card on return.
+	// The button starts a new memo; what is typed there and saved by Done shows as the one card on return.
 	tapFloatingButton();
-	EXPECT_TRUE(openedEditorOn(""));
-	std::string uuid;
-	coverAndComeBack([&] { uuid = addMemo(TestMemo("Groceries", "milk")); });
+	MemoEditView *editor = editorOnTop();
+	ASSERT_NE(nullptr, editor);
+	EXPECT_EQ(nullptr, editor->getCurrentDocInfo());
+	EXPECT_EQ(nullptr, floatingButton());
+	typeIntoBody(editor, "milk and bread");
+	ASSERT_NE(nullptr, doneButton(editor));
+	tapOn(doneButton(editor));
+	ASSERT_TRUE(waitFor([this] { return listView() != nullptr; }));
+	runFor(0.4);
 	ASSERT_NE(nullptr, gengrid());
 	EXPECT_EQ(1, listView()->getGridItemCount());
 	EXPECT_EQ(1u, elm_gengrid_items_count(gengrid()));
 	EXPECT_NE(nullptr, floatingButton());
 
-	// A tap on the card opens it in the editor (read-only, as a memo is opened from the list).
+	// A tap on the card opens it read-only (no Done); a memo written meanwhile shows after back.
 	tapCard(0);
-	EXPECT_TRUE(openedEditorOn(uuid));
+	editor = editorOnTop();
+	ASSERT_NE(nullptr, editor);
+	ASSERT_NE(nullptr, editor->getCurrentDocInfo());
+	EXPECT_NE(std::string::npos, std::string(editor->getCurrentDocInfo()->getContent()).find("milk and bread"));
+	EXPECT_EQ(nullptr, doneButton(editor));
+	addMemo(TestMemo("Groceries", "eggs"));
+	backToList();
+	EXPECT_EQ(2, listView()->getGridItemCount());
+	EXPECT_EQ(2u, elm_gengrid_items_count(gengrid()));
 
 	// Emptied elsewhere: the return shows the empty state again.
-	coverAndComeBack([&] { MemoDbMgr::getInstance()->removeMemo(uuid.c_str()); });
+	coverAndComeBack([&] {
+		MemoItemList *memos = MemoDbMgr::getInstance()->getVisibleMemoListN();
+		for (int i = 0; i < memos->getCount(); ++i)
+			MemoDbMgr::getInstance()->removeMemo(memos->getItem(i)->getMemoUUID());
+		delete memos;
+	});
 	EXPECT_TRUE(showsEmptyState());
 	EXPECT_EQ(0, listView()->getGridItemCount());
 }

@@ -3,6 +3,7 @@
 #include <app.h>
 
 #include "app_private.h"
+#include "dlog_private.h"
 
 #include <dlog.h>
 #include <stdlib.h>
@@ -250,6 +251,8 @@ static void app_state_reset(void)
 /* Runs create, the first request and the main loop; false when create refused. */
 static bool app_run(void)
 {
+	/* The lines of create and of the first request wait with those of the loop's first steps. */
+	dlog_gather_main_thread(true);
 	app_event_language_apply();
 	app_event_watch_start();
 	app.signal_exit_handler = ecore_event_handler_add(ECORE_EVENT_SIGNAL_EXIT, signal_exit_cb, NULL);
@@ -281,6 +284,7 @@ static bool app_run(void)
 	app_event_watch_stop();
 	ecore_event_handler_del(app.signal_exit_handler);
 	app.signal_exit_handler = NULL;
+	dlog_gather_main_thread(false);
 	return created;
 }
 
