@@ -67,8 +67,11 @@ public:
 	void copyFileInfos(const MemoFileInfo *source);
 
 	// Returns the UUID; a record that has none gets a new one here (so asking writes).
+	// Keeps the texts that the setters below may borrow from (the rows of a list read), for the record's life.
+	// A record keeps one such arena: call this first.
+	void keepTexts(std::shared_ptr<const MemoTextArena> texts) { __texts = std::move(texts); }
 	// The same setters for a text that the record may share with other records (a null text is refused as a
-	// null pointer is).
+	// null pointer is). A borrowed text must come from the arena the record keeps.
 	bool setMemoUUID(const MemoText &memoUUID);
 	bool setAccountType(const MemoText &accountType);
 	bool setAccountName(const MemoText &accountName);
@@ -118,6 +121,7 @@ public:
 	void getBgColorRgba(int *red, int *green, int *blue, int *alpha) const;
 
 private:
+	std::shared_ptr<const MemoTextArena> __texts; // first: the fields below may borrow from it
 	MemoText __memoUUID;
 	int __isDirty;
 	int __isDeleted;

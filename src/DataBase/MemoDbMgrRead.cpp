@@ -179,6 +179,7 @@ MemoItemList *MemoDbMgr::__getMemoListN(const char *sql, bool withColor)
 	}
 	for (int row = 0; row < rows->count(); ++row) {
 		MemoDocInfo *info = new MemoDocInfo();
+		info->keepTexts(rows->texts());
 		MemoListRowReader reader(*rows, row);
 		__fillRecord(reader, info, withColor);
 		list->appendItem(info);

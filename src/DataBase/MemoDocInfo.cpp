@@ -33,6 +33,7 @@ MemoDocInfo &MemoDocInfo::operator=(const MemoDocInfo &other)
 {
 	if (this == &other)
 		return *this;
+	__texts = other.__texts;
 	__memoUUID = other.__memoUUID;
 	__isDirty = other.__isDirty;
 	__isDeleted = other.__isDeleted;

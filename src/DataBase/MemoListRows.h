@@ -26,6 +26,8 @@ public:
 	// Reads the rest of the statement's rows.
 	explicit MemoListRows(MemoSqlStmt &stmt, int columns);
 	int count() const { return static_cast<int>(__rows.size() / static_cast<size_t>(__columns)); }
+	// What the texts of the rows are borrowed from: a record holding them keeps it.
+	std::shared_ptr<const MemoTextArena> texts() const { return __texts; }
 	const MemoListValue &at(int row, int column) const
 	{
 		return __rows[static_cast<size_t>(row) * static_cast<size_t>(__columns) + static_cast<size_t>(column)];
@@ -40,6 +42,7 @@ public:
 
 private:
 	int __columns;
+	std::shared_ptr<MemoTextArena> __texts;
 	std::vector<MemoListValue> __rows;
 };
 
