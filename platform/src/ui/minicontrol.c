@@ -111,6 +111,15 @@ static void __hide_intercept_cb(void *data, Evas_Object *obj)
 	__sync_visibility(mc);
 }
 
+/* The buffer engine frees its pixels on a resize even while a render thread still draws into them: the
+   viewers turn these windows at any time, so a resize waits for the render in flight. */
+static void __resize_intercept_cb(void *data, Evas_Object *obj, Evas_Coord w, Evas_Coord h)
+{
+	(void)data;
+	evas_sync(evas_object_evas_get(obj));
+	evas_object_resize(obj, w, h);
+}
+
 /* ---- viewer events ---- */
 
 static void __deliver(minicontrol_window_s *mc, int event, bundle *arg)
@@ -249,6 +258,7 @@ Evas_Object *minicontrol_create_window(const char *name, minicontrol_target_view
 	elm_win_prop_focus_skip_set(mc->win, EINA_TRUE);
 	evas_object_intercept_show_callback_add(mc->win, __show_intercept_cb, mc);
 	evas_object_intercept_hide_callback_add(mc->win, __hide_intercept_cb, mc);
+	evas_object_intercept_resize_callback_add(mc->win, __resize_intercept_cb, mc);
 	evas_object_event_callback_add(mc->win, EVAS_CALLBACK_RESIZE, __resize_cb, mc);
 	evas_object_event_callback_add(mc->win, EVAS_CALLBACK_DEL, __win_del_cb, mc);
 	evas_object_smart_callback_add(mc->win, "delete,request", __delete_request_cb, mc);
