@@ -244,14 +244,17 @@ void MemoRecorder::__pauseResumeCb(void *data, Evas *evas, Evas_Object *obj, voi
 	(void)eventInfo;
 	MemoRecorder *self = static_cast<MemoRecorder *>(data);
 	MemoUtil::playTapFeedback();
-	if (self->__getState() == RECORDER_STATE_RECORDING) {
+	const recorder_state_e state = self->__getState();
+	if (state == RECORDER_STATE_RECORDING) {
 		recorder_pause(self->__recorder);
 	} else {
 		if (self->__isInCall()) {
 			notification_status_message_post(i18n_get_text("IDS_MEMO_TPOP_UNABLE_TO_RECORD_AUDIO_DURING_CALLS"));
 			return;
 		}
-		recorder_start(self->__recorder);
+		// Only a paused take goes on: one that a call has just ended is being stopped.
+		if (state == RECORDER_STATE_PAUSED)
+			recorder_start(self->__recorder);
 	}
 	self->__updateRecorderLayout();
 	self->__updateMpris();

@@ -71,6 +71,12 @@ TEST(CrashSafety, KilledAtRandomTheStoreKeepsEveryAcknowledgedWrite)
 		before[uuid] = bodyAndFiles(app, uuid);
 	ASSERT_EQ(12u, before.size());
 
+	// A text far larger than anyone collects is refused, answered as failed, and changes nothing.
+	std::string out;
+	app.send(OP + "send_text_quickmemo -r" + TEXT + std::string(70000, 'x'), &out);
+	EXPECT_NE(std::string::npos, out.find("result=failed")) << out;
+	EXPECT_TRUE(app.waitForLog("quick memo text of 70000 bytes refused"));
+
 	std::vector<std::string> appended, edited;
 	int kills = 0;
 	auto killSoon = [&](int maxMs) {

@@ -182,6 +182,19 @@ TEST_F(EditViewVoice, ShortTakesAreDroppedAndPausesJoinInOneFile)
 	EXPECT_TRUE(isTop(view));
 	EXPECT_TRUE(voiceFiles().empty());
 
+	// Discarding a take of a second or more asks first, while the take runs on.
+	startRecording();
+	recordUntil(1000);
+	tapPart(recorder(), "recorder_cancel_btn");
+	settle(0.3);
+	ASSERT_TRUE(MemoPopupMonitor::getInstance()->isPopupAlive());
+	EXPECT_TRUE(MemoUtil::isRecorderBusy());
+	tapObject(popupButton(2));
+	settle(0.2);
+	EXPECT_FALSE(MemoUtil::isRecorderBusy());
+	EXPECT_TRUE(voiceFiles().empty());
+	EXPECT_EQ(0, livePanels());
+
 	startRecording();
 	recordUntil(1000);
 	tapPart(recorder(), "recorder_pause_resume_btn");

@@ -16,7 +16,6 @@
 #include <string.h>
 #include <sys/file.h>
 #include <sys/socket.h>
-#include <sys/stat.h>
 #include <sys/un.h>
 #include <time.h>
 #include <unistd.h>
@@ -160,33 +159,13 @@ static int listen_at(const struct sockaddr_un *addr)
 	return fd;
 }
 
-/* The folder of the sockets is the user's alone: other users can neither connect nor put a socket of
-   theirs in the place of ours. One that another user owns is refused; a looser mode of ours is mended. */
-static bool dir_is_private(const char *dir)
-{
-	struct stat st;
-	if (lstat(dir, &st) != 0 || !S_ISDIR(st.st_mode)) {
-		LOGE("%s is not a folder: no launch sockets", dir);
-		return false;
-	}
-	if (st.st_uid != geteuid()) {
-		LOGE("%s belongs to user %u: no launch sockets", dir, (unsigned int)st.st_uid);
-		return false;
-	}
-	if ((st.st_mode & 0077) && chmod(dir, 0700) != 0) {
-		LOGE("%s is open to other users and cannot be closed (%s)", dir, strerror(errno));
-		return false;
-	}
-	return true;
-}
-
 static bool socket_dir_make(const struct sockaddr_un *addr)
 {
 	char *dir = strdup(addr->sun_path);
 	char *slash = dir ? strrchr(dir, '/') : NULL;
 	if (slash)
 		*slash = '\0';
-	bool have_dir = slash && app_paths_mkdir_p(dir) && dir_is_private(dir);
+	bool have_dir = slash && app_paths_mkdir_p(dir) && app_paths_dir_is_private(dir);
 	free(dir);
 	return have_dir;
 }

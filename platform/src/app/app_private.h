@@ -20,6 +20,9 @@ extern "C" {
 char *app_paths_app_id_get(void);
 /* Creates every missing folder of path (mode 0700); true when it exists afterwards. Never logs. */
 bool app_paths_mkdir_p(const char *path);
+/* True when the folder belongs to this user and only this user may open it: a looser mode is mended,
+   another user's folder is refused. Logs a refusal. */
+bool app_paths_dir_is_private(const char *dir);
 /* Folder of per-user run-time files (pid files, logs of started apps), created; malloc'ed, no trailing "/". */
 char *app_paths_runtime_dir_get(void);
 /* Label and icon of the manifest beside the executable, malloc'ed, or NULL. */
