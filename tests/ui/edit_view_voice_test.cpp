@@ -7,10 +7,12 @@
 
 #include "../platform/media_fixture.h"
 #include "DataBase/MemoFileInfo.h"
+#include "Recorder/MPlayerLockScreenMiniController.h"
 #include "Recorder/MRecorderLockScreenMiniController.h"
 #include "Recorder/MRecorderNotiMiniController.h"
 #include "Recorder/MemoPlayer.h"
 #include "Recorder/MemoRecorder.h"
+#include "Recorder/MplayerNotiMiniController.h"
 #include "box_control_fixture.h"
 #include "support/EditViewAppsFixture.h"
 
@@ -26,6 +28,8 @@ struct MemoRecorderTestAccess {
 };
 struct MemoPlayerTestAccess {
 	static player_state_e state(MemoPlayer *p) { return p->__getState(); }
+	static MplayerNotiMiniController *notiMini(MemoPlayer *p) { return p->__notiMini; }
+	static MPlayerLockScreenMiniController *lockMini(MemoPlayer *p) { return p->__lockMini; }
 	// A drag of the slider to `value`, let go there.
 	static void drag(MemoPlayer *p, double value)
 	{
@@ -394,4 +398,46 @@ TEST_F(EditViewVoice, MiniControllersRunTheTakeWhileTheAppIsInTheBackground)
 	EXPECT_EQ(nullptr, minicontrol_viewer_window_find("memo-minicontrol.LOCKSCREEN"));
 	EXPECT_EQ(1u, voiceFiles().size());
 	vconf_set_int(VCONFKEY_IDLE_LOCK_STATE, VCONFKEY_IDLE_UNLOCK);
+}
+
+TEST_F(EditViewVoice, PlaybackInTheBackgroundIsPausedAndEndedFromOutside)
+{
+	const char *memo = "voice-memo-2", *vr = "voice-file-2";
+	const std::string file = mediaDir(memo) + vr + ".amr";
+	ecore_file_mkpath(mediaDir(memo).c_str());
+	ASSERT_TRUE(MediaFiles::record(file, 3000));
+	MemoDocInfo stored;
+	stored.setMemoUUID(memo);
+	stored.setTitle("Song");
+	stored.setTizenXmlContent(todoList(todoItem(0, false, "hum")).c_str());
+	stored.setVrfileUUID(vr);
+	ASSERT_TRUE(MemoDbMgr::getInstance()->addMemo(&stored));
+	MemoFileInfo row;
+	row.setFileUUID(vr);
+	row.setMemoUUID(memo);
+	row.setPath(file.c_str());
+	ASSERT_TRUE(MemoDbMgr::getInstance()->addNewFile(&row));
+	records.emplace_back(MemoDbMgr::getInstance()->getOneMemoN(memo));
+	view = openRecord(records.back().get());
+	ASSERT_NE(player(), nullptr);
+	tapPart(player(), "player_pause_resume_btn");
+	ASSERT_TRUE(waitFor([this] { return MemoPlayerTestAccess::state(player()) == PLAYER_STATE_PLAYING; }));
+
+	MemoBroadCaster::getInstance().emit("broadcast,memo,app,pause", nullptr);
+	MplayerNotiMiniController *noti = MemoPlayerTestAccess::notiMini(player());
+	MPlayerLockScreenMiniController *lock = MemoPlayerTestAccess::lockMini(player());
+	ASSERT_TRUE(noti && lock);
+	EXPECT_EQ(noti->_win, minicontrol_viewer_window_find("memoplayer_mini_controller"));
+	EXPECT_TRUE(waitFor([&] { return strcmp(elm_object_part_text_get(lock->_layout, "play_time"), ""); }));
+	noti->_signal.emit("player,pausedResumed", nullptr);
+	EXPECT_EQ(PLAYER_STATE_PAUSED, MemoPlayerTestAccess::state(player()));
+	lock->_signal.emit("player,pausedResumed", nullptr);
+	EXPECT_EQ(PLAYER_STATE_PLAYING, MemoPlayerTestAccess::state(player()));
+
+	// Cancelled from the notification panel: playback ends and both controllers go.
+	noti->_signal.emit("player,canceled", nullptr);
+	ASSERT_TRUE(waitFor([this] { return !MemoPlayerTestAccess::notiMini(player()); }));
+	EXPECT_EQ(nullptr, MemoPlayerTestAccess::lockMini(player()));
+	EXPECT_EQ(nullptr, minicontrol_viewer_window_find("memoplayer_mini_controller"));
+	EXPECT_EQ(PLAYER_STATE_READY, MemoPlayerTestAccess::state(player()));
 }
