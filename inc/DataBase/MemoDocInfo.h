@@ -5,6 +5,7 @@
 #include <string>
 
 #include "DataBase/MemoFileInfo.h"
+#include "DataBase/MemoText.h"
 
 // A memo holds at most ten images and one voice recording.
 #define MEMO_MAX_FILE_COUNT 11
@@ -26,26 +27,29 @@ public:
 	MemoDocInfo &operator=(const MemoDocInfo &other);
 
 	// Stores the UUID; returns false in every case (no caller reads it).
-	bool setMemoUUID(const char *uuid);
+	bool setMemoUUID(const char *uuid) { return setMemoUUID(MemoText(uuid)); }
 	bool setIsDirty(int isDirty);     // refuses anything but 0 and 1
 	bool setIsDeleted(int isDeleted); // refuses anything but 0 and 1
-	bool setAccountType(const char *accountType);
-	bool setAccountName(const char *accountName);
+	bool setAccountType(const char *accountType) { return setAccountType(MemoText(accountType)); }
+	bool setAccountName(const char *accountName) { return setAccountName(MemoText(accountName)); }
 	bool setSync1(unsigned long long sync1);
-	bool setSync2(const char *sync2);
+	bool setSync2(const char *sync2) { return setSync2(MemoText(sync2)); }
 	bool setIsNeedUpsync(int isNeedUpsync); // refuses anything but 0 and 1
 	bool setCreatedAt(unsigned long long createdAt);
 	bool setLastModifiedAt(unsigned long long lastModifiedAt);
-	bool setCategoryUUID(const char *categoryUUID);
-	bool setTitle(const char *title);
-	bool setContent(const char *content);
-	bool setTizenXmlContent(const char *tizenXmlContent);
-	bool setAndroidXmlContent(const char *androidXmlContent);
-	bool setDisplayContent(const char *displayContent);
-	bool setVrfileUUID(const char *vrfileUUID);
-	bool setStrippedContent(const char *strippedContent);
-	bool setData(const char *data);
-	bool setPhoneNum(const char *phoneNum);
+	bool setCategoryUUID(const char *categoryUUID) { return setCategoryUUID(MemoText(categoryUUID)); }
+	bool setTitle(const char *title) { return setTitle(MemoText(title)); }
+	bool setContent(const char *content) { return setContent(MemoText(content)); }
+	bool setTizenXmlContent(const char *tizenXmlContent) { return setTizenXmlContent(MemoText(tizenXmlContent)); }
+	bool setAndroidXmlContent(const char *androidXmlContent)
+	{
+		return setAndroidXmlContent(MemoText(androidXmlContent));
+	}
+	bool setDisplayContent(const char *displayContent) { return setDisplayContent(MemoText(displayContent)); }
+	bool setVrfileUUID(const char *vrfileUUID) { return setVrfileUUID(MemoText(vrfileUUID)); }
+	bool setStrippedContent(const char *strippedContent) { return setStrippedContent(MemoText(strippedContent)); }
+	bool setData(const char *data) { return setData(MemoText(data)); }
+	bool setPhoneNum(const char *phoneNum) { return setPhoneNum(MemoText(phoneNum)); }
 	bool setIsFavorite(int isFavorite);
 	bool setIsHidden(int isHidden);
 	bool setIsQuick(int isQuick);
@@ -55,7 +59,7 @@ public:
 	// 16 characters long and does not hold exactly four ";" is replaced by the default
 	// first. Returns false, keeping the ints parsed so far, when a ";" is missing.
 	// A field that is no number throws std::invalid_argument from std::stoi.
-	bool setBgColor(const char *bgColor);
+	bool setBgColor(const char *bgColor) { return setBgColor(MemoText(bgColor)); }
 	// Stores the four ints and rebuilds the colour text from them.
 	bool setBgColorRgba(int red, int green, int blue, int alpha);
 	// Copies the first getFileCount() entries of source into the record's files
@@ -63,6 +67,27 @@ public:
 	void copyFileInfos(const MemoFileInfo *source);
 
 	// Returns the UUID; a record that has none gets a new one here (so asking writes).
+	// Keeps the texts that the setters below may borrow from (the rows of a list read), for the record's life.
+	// A record keeps one such arena: call this first.
+	void keepTexts(std::shared_ptr<const MemoTextArena> texts) { __texts = std::move(texts); }
+	// The same setters for a text that the record may share with other records (a null text is refused as a
+	// null pointer is). A borrowed text must come from the arena the record keeps.
+	bool setMemoUUID(const MemoText &memoUUID);
+	bool setAccountType(const MemoText &accountType);
+	bool setAccountName(const MemoText &accountName);
+	bool setSync2(const MemoText &sync2);
+	bool setCategoryUUID(const MemoText &categoryUUID);
+	bool setTitle(const MemoText &title);
+	bool setContent(const MemoText &content);
+	bool setTizenXmlContent(const MemoText &tizenXmlContent);
+	bool setAndroidXmlContent(const MemoText &androidXmlContent);
+	bool setDisplayContent(const MemoText &displayContent);
+	bool setVrfileUUID(const MemoText &vrfileUUID);
+	bool setStrippedContent(const MemoText &strippedContent);
+	bool setData(const MemoText &data);
+	bool setPhoneNum(const MemoText &phoneNum);
+	bool setBgColor(const MemoText &bgColor);
+
 	const char *getMemoUUID();
 	int getIsDirty() const { return __isDirty; }
 	int getIsDeleted() const { return __isDeleted; }
@@ -96,26 +121,27 @@ public:
 	void getBgColorRgba(int *red, int *green, int *blue, int *alpha) const;
 
 private:
-	std::string __memoUUID;
+	std::shared_ptr<const MemoTextArena> __texts; // first: the fields below may borrow from it
+	MemoText __memoUUID;
 	int __isDirty;
 	int __isDeleted;
-	std::string __accountType;
-	std::string __accountName;
+	MemoText __accountType;
+	MemoText __accountName;
 	unsigned long long __sync1;
-	std::string __sync2;
+	MemoText __sync2;
 	int __isNeedUpsync;
 	unsigned long long __createdAt;
 	unsigned long long __lastModifiedAt;
-	std::string __categoryUUID;
-	std::string __title;
-	std::string __content;
-	std::string __androidXmlContent;
-	std::string __tizenXmlContent;
-	std::string __displayContent;
-	std::string __vrfileUUID;
-	std::string __strippedContent;
-	std::string __data;
-	std::string __phoneNum;
+	MemoText __categoryUUID;
+	MemoText __title;
+	MemoText __content;
+	MemoText __androidXmlContent;
+	MemoText __tizenXmlContent;
+	MemoText __displayContent;
+	MemoText __vrfileUUID;
+	MemoText __strippedContent;
+	MemoText __data;
+	MemoText __phoneNum;
 	int __isFavorite;
 	int __isHidden;
 	int __isQuick;
@@ -125,7 +151,7 @@ private:
 	int __bgGreen;
 	int __bgBlue;
 	int __bgAlpha;
-	std::string __bgColor;
+	MemoText __bgColor;
 	int __changed;
 };
 

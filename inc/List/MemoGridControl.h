@@ -1,6 +1,8 @@
 #ifndef INC_LIST_MEMOGRIDCONTROL_H
 #define INC_LIST_MEMOGRIDCONTROL_H
 
+#include <vector>
+
 #include <Elementary.h>
 
 #include <WSignal.h>
@@ -55,6 +57,10 @@ public:
 private:
 	void __setGridSize(Evas_Object *gengrid);
 	void __appendItem(MemoDocInfo *record, int row, const char *keyword);
+	// MemoGridControlSearch.cpp: turns the search grid's cards into those of `records` by deleting the others
+	// and giving the rest the keyword; false (nothing changed) when a card of records is missing or the
+	// order differs.
+	bool __reconcileSearchItems(const std::vector<MemoDocInfo *> &records, const char *keyword);
 	int __getItemType(MemoDocInfo *record);
 	static void __scrollCb(void *data, Evas_Object *obj, void *eventInfo);
 	static void __pressedItemCb(void *data, Evas_Object *obj, void *eventInfo);
@@ -70,6 +76,8 @@ private:
 	bool __scrolledInPortrait;
 	bool __scrolledInLandscape;
 	int __scrollEventCount;
+	// The gengrid holds the cards of a search (each with the keyword), not those of a full update.
+	bool __searchShown = false;
 
 	// Shared by every grid of the process: a new grid forgets the position of the others.
 	static int savedScrollX;

@@ -6,11 +6,13 @@
 #include <player.h>
 
 #include <Elementary.h>
+#include <string>
 #include <WSignal.h>
 #include <WViewController.h>
 
 class MplayerNotiMiniController;
 class MPlayerLockScreenMiniController;
+class MemoMprisPlayer;
 
 // The panel that plays a memo's voice file: play and pause, a slider with the position and the length, and
 // in an edit a delete button that asks first. The owner swallows it in its layout's part "recorder_contents"
@@ -25,6 +27,8 @@ public:
 	// The file to play; copied.
 	explicit MemoPlayer(const char *filePath);
 	~MemoPlayer() override;
+	// The memo's title, which the desktop's media controls show while the file plays; copied.
+	void setMediaTitle(const char *title);
 
 protected:
 	// Any non-null `param` shows the panel for reading (no delete button); null gives the edit form. Null
@@ -68,13 +72,15 @@ private:
 	bool __sendMessagePort();
 	static void __media_key_event_cb(media_key_e key, media_key_event_e status, void *data);
 	static void __playerInterruptedCb(player_interrupted_code_e code, void *data);
-	// The mini controllers keep playback controllable from outside the app; until they exist these only say
-	// where they come in.
+	// The mini controllers keep playback controllable from the notification panel and the lock screen while
+	// the app is in the background.
 	void __createMiniControllers();
 	void __destroyMiniControllers();
 	void __setMiniTime(const char *text, int ms);
 	void __refreshNotiMini();
 	void __refreshLockMini();
+	void __onNotiMiniEvent(const char *event);
+	void __onLockMiniEvent(const char *event);
 
 	bool __mediaKeyPressed;
 	player_h __player;
@@ -98,6 +104,14 @@ private:
 	MplayerNotiMiniController *__notiMini;
 	MPlayerLockScreenMiniController *__lockMini;
 	bool __inBackground;
+
+	// ---- The desktop's media controls (MemoPlayerMpris.cpp) ----
+	// Published from the start of playback to its end.
+	void __startMpris();
+	void __stopMpris();
+	void __updateMpris();
+	MemoMprisPlayer *__mpris = nullptr;
+	std::string __mediaTitle;
 };
 
 #endif

@@ -7,11 +7,13 @@
 #include <sound_manager_product.h>
 
 #include <Elementary.h>
+#include <string>
 #include <WSignal.h>
 #include <WViewController.h>
 
 class MRecorderNotiMiniController;
 class MRecorderLockScreenMiniController;
+class MemoMprisPlayer;
 
 // The panel that records one voice memo into the memo's media folder, as "<data>media/<memo UUID>/<file
 // UUID>.amr" (AMR-NB, 8 kHz, 12.2 kbit/s, at most an hour or 7200 KB). The owner swallows it in its
@@ -31,6 +33,8 @@ public:
 	void recorderStop();
 	// The stop button's handler: tap feedback, then recorderStop() after 0.1 s. `data` is the recorder.
 	static void recorderStopCb(void *data, Evas *evas, Evas_Object *obj, void *eventInfo);
+	// The memo's title, which the desktop's media controls show while the take runs; copied.
+	void setMediaTitle(const char *title);
 	// True when the recorder last reported more than 999 ms.
 	bool isRecordedEnough() const;
 	// True from the start tap until the take is given up or the panel goes: a committed take keeps it.
@@ -82,13 +86,15 @@ private:
 	bool __sendMessagePort();
 	static void __media_key_event_cb(media_key_e key, media_key_event_e status, void *data);
 	static void _soundActiveDeviceChangedCb(sound_device_in_e in, sound_device_out_e out, void *data);
-	// The mini controllers keep a take controllable from outside the app; until they exist these only say
-	// where they come in.
+	// The mini controllers keep a take controllable from the notification panel and the lock screen while
+	// the app is in the background.
 	void __createMiniControllers();
 	void __destroyMiniControllers();
 	void __setMiniTime(const char *text, unsigned long long ms);
 	void __refreshNotiMini();
 	void __refreshLockMini();
+	void __onNotiMiniEvent(const char *event);
+	void __onLockMiniEvent(const char *event);
 
 	recorder_h __recorder;
 	bool __mediaKeyPressed;
@@ -107,6 +113,14 @@ private:
 	MRecorderLockScreenMiniController *__lockMini;
 	bool __inBackground;
 	int __lastInputDevice;
+
+	// ---- The desktop's media controls (MemoRecorderMpris.cpp) ----
+	// Published from the start of the take to its end.
+	void __startMpris();
+	void __stopMpris();
+	void __updateMpris();
+	MemoMprisPlayer *__mpris = nullptr;
+	std::string __mediaTitle;
 
 	// The time limit of a take in seconds: an hour.
 	static int __timeLimitSeconds;

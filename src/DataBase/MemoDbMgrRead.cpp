@@ -76,6 +76,17 @@ static bool __isOwnMarkup(const char *text)
 	return true;
 }
 
+// The characters of a column's text, null for SQL NULL, from a statement or from kept rows.
+static const char *__chars(const char *text)
+{
+	return text;
+}
+
+static const char *__chars(const MemoText &text)
+{
+	return text.isNull() ? nullptr : text.c_str();
+}
+
 template <typename Row> static void __fillRecord(Row &stmt, MemoDocInfo *info, bool withColor)
 {
 	info->setMemoUUID(stmt.text(0));
@@ -90,11 +101,11 @@ template <typename Row> static void __fillRecord(Row &stmt, MemoDocInfo *info, b
 	info->setLastModifiedAt(stmt.u64(9));
 	info->setCategoryUUID(stmt.text(10));
 	if (withColor) {
-		const char *plain = stmt.text(11);
-		if (__isOwnMarkup(plain)) {
+		const auto &plain = stmt.text(11);
+		if (__isOwnMarkup(__chars(plain))) {
 			info->setTitle(plain);
 		} else {
-			char *title = elm_entry_utf8_to_markup(plain);
+			char *title = elm_entry_utf8_to_markup(__chars(plain));
 			info->setTitle(title);
 			free(title);
 		}
@@ -168,6 +179,7 @@ MemoItemList *MemoDbMgr::__getMemoListN(const char *sql, bool withColor)
 	}
 	for (int row = 0; row < rows->count(); ++row) {
 		MemoDocInfo *info = new MemoDocInfo();
+		info->keepTexts(rows->texts());
 		MemoListRowReader reader(*rows, row);
 		__fillRecord(reader, info, withColor);
 		list->appendItem(info);

@@ -7,10 +7,17 @@
 #include "MemoRecordField.h"
 #include "Util/MemoUtil.h"
 
+// One default colour text for every record.
+static const MemoText &__defaultColor()
+{
+	static const MemoText color(MEMO_DEFAULT_BG_COLOR);
+	return color;
+}
+
 MemoDocInfo::MemoDocInfo()
     : __isDirty(1), __isDeleted(0), __sync1(0), __isNeedUpsync(1), __createdAt(1), __lastModifiedAt(1), __isFavorite(0),
       __isHidden(0), __isQuick(0), __fileCount(0), __bgRed(228), __bgGreen(235), __bgBlue(235), __bgAlpha(255),
-      __bgColor(MEMO_DEFAULT_BG_COLOR), __changed(0)
+      __bgColor(__defaultColor()), __changed(0)
 {
 	(void)__changed;
 }
@@ -26,6 +33,7 @@ MemoDocInfo &MemoDocInfo::operator=(const MemoDocInfo &other)
 {
 	if (this == &other)
 		return *this;
+	__texts = other.__texts;
 	__memoUUID = other.__memoUUID;
 	__isDirty = other.__isDirty;
 	__isDeleted = other.__isDeleted;
@@ -79,9 +87,9 @@ const MemoFileInfo *MemoDocInfo::getFiles() const
 	return __files.get();
 }
 
-bool MemoDocInfo::setMemoUUID(const char *uuid)
+bool MemoDocInfo::setMemoUUID(const MemoText &uuid)
 {
-	if (!uuid) {
+	if (uuid.isNull()) {
 		MEMO_LOGE("uuid is NULL");
 		return false;
 	}
@@ -99,14 +107,14 @@ bool MemoDocInfo::setIsDeleted(int isDeleted)
 	MEMO_RECORD_SET(memoRecordIsFlag(isDeleted), __isDeleted, isDeleted, "isDeleted is Wrong Value");
 }
 
-bool MemoDocInfo::setAccountType(const char *accountType)
+bool MemoDocInfo::setAccountType(const MemoText &accountType)
 {
-	MEMO_RECORD_SET(accountType, __accountType, accountType, "accountType is NULL");
+	MEMO_RECORD_SET(!accountType.isNull(), __accountType, accountType, "accountType is NULL");
 }
 
-bool MemoDocInfo::setAccountName(const char *accountName)
+bool MemoDocInfo::setAccountName(const MemoText &accountName)
 {
-	MEMO_RECORD_SET(accountName, __accountName, accountName, "accountName is NULL");
+	MEMO_RECORD_SET(!accountName.isNull(), __accountName, accountName, "accountName is NULL");
 }
 
 bool MemoDocInfo::setSync1(unsigned long long sync1)
@@ -115,9 +123,9 @@ bool MemoDocInfo::setSync1(unsigned long long sync1)
 	return true;
 }
 
-bool MemoDocInfo::setSync2(const char *sync2)
+bool MemoDocInfo::setSync2(const MemoText &sync2)
 {
-	MEMO_RECORD_SET(sync2, __sync2, sync2, "sync2 is NULL");
+	MEMO_RECORD_SET(!sync2.isNull(), __sync2, sync2, "sync2 is NULL");
 }
 
 bool MemoDocInfo::setIsNeedUpsync(int isNeedUpsync)
@@ -137,55 +145,55 @@ bool MemoDocInfo::setLastModifiedAt(unsigned long long lastModifiedAt)
 	return true;
 }
 
-bool MemoDocInfo::setCategoryUUID(const char *categoryUUID)
+bool MemoDocInfo::setCategoryUUID(const MemoText &categoryUUID)
 {
-	MEMO_RECORD_SET(categoryUUID, __categoryUUID, categoryUUID, "categoryUUID is NULL");
+	MEMO_RECORD_SET(!categoryUUID.isNull(), __categoryUUID, categoryUUID, "categoryUUID is NULL");
 }
 
-bool MemoDocInfo::setTitle(const char *title)
+bool MemoDocInfo::setTitle(const MemoText &title)
 {
-	MEMO_RECORD_SET(title, __title, title, "title is NULL");
+	MEMO_RECORD_SET(!title.isNull(), __title, title, "title is NULL");
 }
 
-bool MemoDocInfo::setContent(const char *content)
+bool MemoDocInfo::setContent(const MemoText &content)
 {
-	MEMO_RECORD_SET(content, __content, content, "content is NULL");
+	MEMO_RECORD_SET(!content.isNull(), __content, content, "content is NULL");
 }
 
-bool MemoDocInfo::setTizenXmlContent(const char *tizenXmlContent)
+bool MemoDocInfo::setTizenXmlContent(const MemoText &tizenXmlContent)
 {
-	MEMO_RECORD_SET(tizenXmlContent, __tizenXmlContent, tizenXmlContent, "tizenXmlContent is NULL");
+	MEMO_RECORD_SET(!tizenXmlContent.isNull(), __tizenXmlContent, tizenXmlContent, "tizenXmlContent is NULL");
 }
 
-bool MemoDocInfo::setAndroidXmlContent(const char *androidXmlContent)
+bool MemoDocInfo::setAndroidXmlContent(const MemoText &androidXmlContent)
 {
-	MEMO_RECORD_SET(androidXmlContent, __androidXmlContent, androidXmlContent, "androidXmlContent is NULL");
+	MEMO_RECORD_SET(!androidXmlContent.isNull(), __androidXmlContent, androidXmlContent, "androidXmlContent is NULL");
 }
 
-bool MemoDocInfo::setDisplayContent(const char *displayContent)
+bool MemoDocInfo::setDisplayContent(const MemoText &displayContent)
 {
-	MEMO_RECORD_SET(displayContent, __displayContent, displayContent, "display_Content is NULL");
+	MEMO_RECORD_SET(!displayContent.isNull(), __displayContent, displayContent, "display_Content is NULL");
 }
 
-bool MemoDocInfo::setVrfileUUID(const char *vrfileUUID)
+bool MemoDocInfo::setVrfileUUID(const MemoText &vrfileUUID)
 {
-	MEMO_RECORD_SET(vrfileUUID, __vrfileUUID, vrfileUUID, "vrfileUUID is NULL");
+	MEMO_RECORD_SET(!vrfileUUID.isNull(), __vrfileUUID, vrfileUUID, "vrfileUUID is NULL");
 }
 
-bool MemoDocInfo::setStrippedContent(const char *strippedContent)
+bool MemoDocInfo::setStrippedContent(const MemoText &strippedContent)
 {
-	MEMO_RECORD_SET(strippedContent, __strippedContent, strippedContent, "strippedContent is NULL");
+	MEMO_RECORD_SET(!strippedContent.isNull(), __strippedContent, strippedContent, "strippedContent is NULL");
 }
 
-bool MemoDocInfo::setData(const char *data)
+bool MemoDocInfo::setData(const MemoText &data)
 {
-	MEMO_RECORD_SET(data, __data, data, "data is NULL");
+	MEMO_RECORD_SET(!data.isNull(), __data, data, "data is NULL");
 }
 
-bool MemoDocInfo::setPhoneNum(const char *phoneNum)
+bool MemoDocInfo::setPhoneNum(const MemoText &phoneNum)
 {
 	// _phoneNum is NULL on most rows: no line for it.
-	if (!phoneNum)
+	if (phoneNum.isNull())
 		return false;
 	__phoneNum = phoneNum;
 	return true;
@@ -214,27 +222,55 @@ bool MemoDocInfo::setFileCount(int fileCount)
 	MEMO_RECORD_SET(fileCount >= 0, __fileCount, fileCount, "fileCount is Wrong Value");
 }
 
-bool MemoDocInfo::setBgColor(const char *bgColor)
+// The channels of a colour text of plain numbers (one to nine digits each), as std::stoi reads them; false for
+// any other text, which the general reading below takes.
+static bool __readPlainColor(const char *text, int *const channels[4], bool *complete)
 {
-	__bgColor = bgColor ? bgColor : "";
+	if (text[strspn(text, "0123456789;")] != '\0')
+		return false;
+	for (int i = 0; i < 4; ++i) {
+		const char *end = strchr(text, ';');
+		if (!end) {
+			*complete = false;
+			return true;
+		}
+		if (end == text || end - text > 9)
+			return false;
+		int value = 0;
+		for (; text < end; ++text)
+			value = value * 10 + (*text - '0');
+		*channels[i] = value;
+		text = end + 1;
+	}
+	*complete = true;
+	return true;
+}
+
+bool MemoDocInfo::setBgColor(const MemoText &bgColor)
+{
+	__bgColor = bgColor.isNull() ? MemoText("") : bgColor;
 	// A 16-character text ("rrr;ggg;bbb;aaa;") is trusted as it stands; anything else
 	// must at least have its four separators.
 	if (__bgColor.length() != 16) {
 		size_t separators = 0;
-		for (char c : __bgColor)
-			if (c == ';')
+		for (const char *c = __bgColor.c_str(); *c; ++c)
+			if (*c == ';')
 				++separators;
 		if (__bgColor.empty() || separators != 4)
-			__bgColor = MEMO_DEFAULT_BG_COLOR;
+			__bgColor = __defaultColor();
 	}
 
-	int *channels[] = {&__bgRed, &__bgGreen, &__bgBlue, &__bgAlpha};
+	int *const channels[] = {&__bgRed, &__bgGreen, &__bgBlue, &__bgAlpha};
+	bool complete = false;
+	if (__readPlainColor(__bgColor.c_str(), channels, &complete))
+		return complete;
+	const std::string color = __bgColor.c_str();
 	size_t start = 0;
 	for (int *channel : channels) {
-		size_t end = __bgColor.find(';', start);
+		size_t end = color.find(';', start);
 		if (end == std::string::npos)
 			return false;
-		*channel = std::stoi(__bgColor.substr(start, end - start));
+		*channel = std::stoi(color.substr(start, end - start));
 		start = end + 1;
 	}
 	return true;
@@ -246,8 +282,9 @@ bool MemoDocInfo::setBgColorRgba(int red, int green, int blue, int alpha)
 	__bgGreen = green;
 	__bgBlue = blue;
 	__bgAlpha = alpha;
-	__bgColor = std::to_string(red) + ";" + std::to_string(green) + ";" + std::to_string(blue) + ";" +
-	            std::to_string(alpha) + ";";
+	__bgColor = MemoText((std::to_string(red) + ";" + std::to_string(green) + ";" + std::to_string(blue) + ";" +
+	                      std::to_string(alpha) + ";")
+	                         .c_str());
 	return true;
 }
 

@@ -37,12 +37,21 @@ Eina_Bool __dropCb(void *)
 }
 } // namespace
 
-MemoListRows::MemoListRows(MemoSqlStmt &stmt, int columns) : __columns(columns)
+MemoListRows::MemoListRows(MemoSqlStmt &stmt, int columns)
+    : __columns(columns), __texts(std::make_shared<MemoTextArena>())
 {
 	while (stmt.step() == SQLITE_ROW) {
 		for (int c = 0; c < columns; ++c) {
-			const char *text = stmt.text(c);
-			__rows.push_back({text == nullptr, static_cast<long long>(stmt.u64(c)), text ? text : ""});
+			const int type = stmt.type(c);
+			if (type == SQLITE_INTEGER) {
+				__rows.push_back({static_cast<long long>(stmt.u64(c)), MemoText(), true});
+			} else if (type == SQLITE_NULL) {
+				__rows.push_back({0, MemoText(), false});
+			} else {
+				// The text first: the integer reading of a text leaves it as it was.
+				MemoText value = __texts->add(stmt.text(c));
+				__rows.push_back({static_cast<long long>(stmt.u64(c)), std::move(value), false});
+			}
 		}
 	}
 }

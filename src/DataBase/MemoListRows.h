@@ -9,13 +9,15 @@
 #include <string>
 #include <vector>
 
+#include "DataBase/MemoText.h"
 #include "MemoSqlStmt.h"
 
-// One column value of a row: its text (null for SQL NULL) and its integer value.
+// One column value of a row: its text (null for SQL NULL) and its integer value, as the statement gives them.
+// An integer's text is made when it is first asked for (the list reads ask for none).
 struct MemoListValue {
-	bool isNull;
 	long long integer;
-	std::string text;
+	mutable MemoText text;
+	bool isInteger;
 };
 
 class MemoListRows
@@ -24,6 +26,8 @@ public:
 	// Reads the rest of the statement's rows.
 	explicit MemoListRows(MemoSqlStmt &stmt, int columns);
 	int count() const { return static_cast<int>(__rows.size() / static_cast<size_t>(__columns)); }
+	// What the texts of the rows are borrowed from: a record holding them keeps it.
+	std::shared_ptr<const MemoTextArena> texts() const { return __texts; }
 	const MemoListValue &at(int row, int column) const
 	{
 		return __rows[static_cast<size_t>(row) * static_cast<size_t>(__columns) + static_cast<size_t>(column)];
@@ -38,6 +42,7 @@ public:
 
 private:
 	int __columns;
+	std::shared_ptr<MemoTextArena> __texts;
 	std::vector<MemoListValue> __rows;
 };
 
@@ -46,10 +51,12 @@ class MemoListRowReader
 {
 public:
 	MemoListRowReader(const MemoListRows &rows, int row) : __rows(rows), __row(row) {}
-	const char *text(int column)
+	const MemoText &text(int column)
 	{
 		const MemoListValue &value = __rows.at(__row, column);
-		return value.isNull ? nullptr : value.text.c_str();
+		if (value.isInteger && value.text.isNull())
+			value.text = MemoText(std::to_string(value.integer).c_str());
+		return value.text;
 	}
 	int integer(int column) { return static_cast<int>(__rows.at(__row, column).integer); }
 	unsigned long long u64(int column) { return static_cast<unsigned long long>(__rows.at(__row, column).integer); }

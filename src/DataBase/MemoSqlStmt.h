@@ -23,6 +23,7 @@ public:
 	int integer(int column) { return sqlite3_column_int(__stmt, column); }
 	unsigned long long u64(int column) { return static_cast<unsigned long long>(sqlite3_column_int64(__stmt, column)); }
 	int bytes(int column) { return sqlite3_column_bytes(__stmt, column); }
+	int type(int column) { return sqlite3_column_type(__stmt, column); }
 
 private:
 	sqlite3_stmt *__stmt;

@@ -29,6 +29,7 @@ MemoPlayer::MemoPlayer(const char *filePath)
 MemoPlayer::~MemoPlayer()
 {
 	__destroyMiniControllers();
+	__stopMpris();
 	free(__filePath);
 }
 
@@ -129,6 +130,7 @@ void MemoPlayer::onDestroy()
 		ecore_timer_del(__progressTimer);
 		__progressTimer = nullptr;
 	}
+	__stopMpris();
 	if (__player) {
 		player_destroy(__player);
 		__player = nullptr;
@@ -225,6 +227,8 @@ void MemoPlayer::__playerStartCb(void *data, Evas *evas, Evas_Object *obj, void 
 	player_start(self->__player);
 	self->__startProgress();
 	self->__updatePlayerLayout();
+	self->__startMpris();
+	self->__updateMpris();
 	self->__signal.emit("player,start", "To do. uuid");
 }
 
@@ -262,6 +266,8 @@ void MemoPlayer::__pauseResumeCb(void *data, Evas *evas, Evas_Object *obj, void 
 		self->__startProgress();
 	}
 	self->__updatePlayerLayout();
+	self->__startMpris();
+	self->__updateMpris();
 	if (self->__notiMini) {
 		self->__sendMessagePort();
 		self->__refreshNotiMini();
@@ -321,6 +327,7 @@ void MemoPlayer::__playerResetJob(void *data)
 	elm_object_part_text_set(self->getEvasObj(), "recorder_slider.time", "00:00:00");
 	self->__resetJob = nullptr;
 	memoVoiceMediaKeyReleaseAsync();
+	self->__stopMpris();
 	if (self->__notiMini || self->__lockMini) {
 		self->__destroyMiniControllers();
 		self->__sendMessagePort();

@@ -10,7 +10,9 @@
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
 #include "Model/MemoPopupMonitor.h"
+#include "Recorder/MPlayerLockScreenMiniController.h"
 #include "Recorder/MemoVoicePanel.h"
+#include "Recorder/MplayerNotiMiniController.h"
 #include "Util/MemoUtil.h"
 
 using app_assist::WPopupController;
@@ -67,6 +69,9 @@ void MemoPlayer::__playerDelete()
 	memoVoiceMediaKeyReleaseAsync();
 	__signal.emit("player,delete", nullptr);
 }
+
+// From one hour on the notification controller shows the time in its hour part.
+static const int HOUR_MS = 3600000;
 
 void MemoPlayer::__playerBroadCasterCb(const char *key)
 {
@@ -139,6 +144,7 @@ void MemoPlayer::__playerInterruptedCb(player_interrupted_code_e code, void *dat
 		self->__playerResume();
 		self->__updatePlayerLayout();
 	}
+	self->__updateMpris();
 	if (self->__notiMini) {
 		self->__refreshNotiMini();
 		self->__sendMessagePort();
@@ -149,22 +155,64 @@ void MemoPlayer::__playerInterruptedCb(player_interrupted_code_e code, void *dat
 
 void MemoPlayer::__createMiniControllers()
 {
-	MEMO_LOGI("no mini controllers yet: playback is controlled from the app only");
+	__notiMini = new MplayerNotiMiniController(__player);
+	__notiMini->create();
+	__notiMini->_signal.addListener([this](const char *event, const char *) { __onNotiMiniEvent(event); });
+	__lockMini = new MPlayerLockScreenMiniController(__player);
+	__lockMini->create();
+	__lockMini->_signal.addListener([this](const char *event, const char *) { __onLockMiniEvent(event); });
 }
 
 void MemoPlayer::__destroyMiniControllers()
 {
-	// Nothing makes them yet.
-	__notiMini = nullptr;
-	__lockMini = nullptr;
+	if (__notiMini) {
+		__notiMini->hide();
+		delete __notiMini;
+		__notiMini = nullptr;
+	}
+	if (__lockMini) {
+		__lockMini->hide();
+		delete __lockMini;
+		__lockMini = nullptr;
+	}
 }
 
 void MemoPlayer::__setMiniTime(const char *text, int ms)
 {
-	(void)text;
-	(void)ms;
+	if (__notiMini) {
+		if (ms >= HOUR_MS)
+			__notiMini->setTimeHour(text);
+		else
+			__notiMini->setTime(text);
+	}
+	if (__lockMini)
+		__lockMini->setTime(text);
 }
 
-void MemoPlayer::__refreshNotiMini() {}
+void MemoPlayer::__refreshNotiMini()
+{
+	if (__notiMini)
+		__notiMini->update();
+}
 
-void MemoPlayer::__refreshLockMini() {}
+void MemoPlayer::__refreshLockMini()
+{
+	if (__lockMini)
+		__lockMini->update();
+}
+
+void MemoPlayer::__onNotiMiniEvent(const char *event)
+{
+	if (!strcmp(event, "player,pausedResumed"))
+		__pauseResumeCb(this, nullptr, nullptr, nullptr);
+	else if (!strcmp(event, "player,canceled"))
+		__playerCompletedCb(this);
+	__refreshLockMini();
+}
+
+void MemoPlayer::__onLockMiniEvent(const char *event)
+{
+	if (!strcmp(event, "player,pausedResumed"))
+		__pauseResumeCb(this, nullptr, nullptr, nullptr);
+	__refreshNotiMini();
+}

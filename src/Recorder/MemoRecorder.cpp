@@ -15,6 +15,7 @@
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
 #include "Model/MemoPopupMonitor.h"
+#include "Recorder/MemoMprisPlayer.h"
 #include "Recorder/MemoVoicePanel.h"
 #include "Util/MemoUtil.h"
 
@@ -43,6 +44,7 @@ MemoRecorder::~MemoRecorder()
 	free(__filePath);
 	sound_manager_unset_active_device_changed_cb();
 	__destroyMiniControllers();
+	__stopMpris();
 }
 
 Evas_Object *MemoRecorder::onCreateView(Evas_Object *parent, void *param)
@@ -124,6 +126,7 @@ void MemoRecorder::onDestroy()
 		}
 	}
 	__destroySession("onDestroy");
+	__stopMpris();
 	if (__callManager) {
 		cm_deinit(__callManager);
 		__callManager = nullptr;
@@ -187,6 +190,8 @@ void MemoRecorder::__showTime(unsigned long long ms)
 	memoVoiceFormatTime(static_cast<long long>(ms), text, sizeof(text));
 	elm_object_part_text_set(getEvasObj(), "recorder_time", text);
 	__setMiniTime(text, ms);
+	if (__mpris)
+		__mpris->setPosition(ms);
 }
 
 void MemoRecorder::__recorderCreateCb(void *data, Evas *evas, Evas_Object *obj, void *eventInfo)
@@ -228,6 +233,7 @@ void MemoRecorder::__onStartTimer()
 	__stopBtn = __takePartObject("recorder_stop_btn", recorderStopCb);
 	__pauseResumeBtn = __takePartObject("recorder_pause_resume_btn", __pauseResumeCb);
 	__updateRecorderLayout();
+	__startMpris();
 	__signal.emit("recorder,start", __fileUUID);
 }
 
@@ -238,16 +244,20 @@ void MemoRecorder::__pauseResumeCb(void *data, Evas *evas, Evas_Object *obj, voi
 	(void)eventInfo;
 	MemoRecorder *self = static_cast<MemoRecorder *>(data);
 	MemoUtil::playTapFeedback();
-	if (self->__getState() == RECORDER_STATE_RECORDING) {
+	const recorder_state_e state = self->__getState();
+	if (state == RECORDER_STATE_RECORDING) {
 		recorder_pause(self->__recorder);
 	} else {
 		if (self->__isInCall()) {
 			notification_status_message_post(i18n_get_text("IDS_MEMO_TPOP_UNABLE_TO_RECORD_AUDIO_DURING_CALLS"));
 			return;
 		}
-		recorder_start(self->__recorder);
+		// Only a paused take goes on: one that a call has just ended is being stopped.
+		if (state == RECORDER_STATE_PAUSED)
+			recorder_start(self->__recorder);
 	}
 	self->__updateRecorderLayout();
+	self->__updateMpris();
 	if (self->__notiMini) {
 		self->__sendMessagePort();
 		self->__refreshNotiMini();

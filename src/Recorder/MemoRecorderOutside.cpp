@@ -9,7 +9,13 @@
 
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
+#include "Model/MemoPopupMonitor.h"
+#include "Recorder/MRecorderLockScreenMiniController.h"
+#include "Recorder/MRecorderNotiMiniController.h"
 #include "Recorder/MemoVoicePanel.h"
+
+// From one hour on the notification controller shows the time in its hour part.
+static const unsigned long long HOUR_MS = 3600000;
 
 void MemoRecorder::__recorderBroadCasterCb(const char *key)
 {
@@ -92,22 +98,73 @@ void MemoRecorder::_soundActiveDeviceChangedCb(sound_device_in_e in, sound_devic
 
 void MemoRecorder::__createMiniControllers()
 {
-	MEMO_LOGI("no mini controllers yet: the take is controlled from the app only");
+	__notiMini = new MRecorderNotiMiniController(__recorder);
+	__notiMini->create();
+	__notiMini->_signal.addListener([this](const char *event, const char *) { __onNotiMiniEvent(event); });
+	__lockMini = new MRecorderLockScreenMiniController(__recorder);
+	__lockMini->create();
+	__lockMini->_signal.addListener([this](const char *event, const char *) { __onLockMiniEvent(event); });
 }
 
 void MemoRecorder::__destroyMiniControllers()
 {
-	// Nothing makes them yet.
-	__lockMini = nullptr;
-	__notiMini = nullptr;
+	if (__lockMini) {
+		__lockMini->hide();
+		delete __lockMini;
+		__lockMini = nullptr;
+	}
+	if (__notiMini) {
+		__notiMini->hide();
+		delete __notiMini;
+		__notiMini = nullptr;
+	}
 }
 
 void MemoRecorder::__setMiniTime(const char *text, unsigned long long ms)
 {
-	(void)text;
-	(void)ms;
+	if (__notiMini) {
+		if (ms < HOUR_MS)
+			__notiMini->setTime(text);
+		else
+			__notiMini->setTimeHour(text);
+	}
+	if (__lockMini)
+		__lockMini->setTime(text);
 }
 
-void MemoRecorder::__refreshNotiMini() {}
+void MemoRecorder::__refreshNotiMini()
+{
+	if (__notiMini)
+		__notiMini->update();
+}
 
-void MemoRecorder::__refreshLockMini() {}
+void MemoRecorder::__refreshLockMini()
+{
+	if (__lockMini)
+		__lockMini->update();
+}
+
+void MemoRecorder::__onNotiMiniEvent(const char *event)
+{
+	if (!strcmp(event, "recorder,paused") || !strcmp(event, "recorder,resumed")) {
+		__pauseResumeCb(this, nullptr, nullptr, nullptr);
+	} else if (!strcmp(event, "recorder,stopped")) {
+		recorderStopCb(this, nullptr, nullptr, nullptr);
+		__sendMessagePort();
+	} else if (!strcmp(event, "recorder,canceled")) {
+		if (MemoPopupMonitor::getInstance()->isPopupAlive())
+			destroyPopup();
+		__recorderCancel();
+		__sendMessagePort();
+	}
+	__refreshLockMini();
+}
+
+void MemoRecorder::__onLockMiniEvent(const char *event)
+{
+	if (!strcmp(event, "recorder,paused") || !strcmp(event, "recorder,resumed"))
+		__pauseResumeCb(this, nullptr, nullptr, nullptr);
+	else if (!strcmp(event, "recorder,stopped"))
+		recorderStopCb(this, nullptr, nullptr, nullptr);
+	__refreshNotiMini();
+}

@@ -126,6 +126,7 @@ void MemoRecorder::recorderStop()
 	}
 	memoVoiceMediaKeyReleaseAsync();
 	elm_object_signal_emit(getEvasObj(), "recorder,cancel", "elm");
+	__stopMpris();
 	__signal.emit("recorder,stop", __fileUUID);
 	if (__notiMini || __lockMini) {
 		__destroyMiniControllers();
@@ -156,6 +157,7 @@ void MemoRecorder::__recorderCancel()
 		cm_deinit(__callManager);
 		__callManager = nullptr;
 	}
+	__stopMpris();
 	__signal.emit("recorder,delete", __fileUUID);
 	app_assist::WUiTimer::addTimer(
 	    0.1,

@@ -8,7 +8,9 @@
 
 #include <Ecore_File.h>
 #include <WUiTimer.h>
+#include <app_common.h>
 
+#include "Box/MemoBoxControl.h"
 #include "Box/MemoBoxItem.h"
 #include "DataBase/MemoDbMgr.h"
 #include "MemoLog.h"
@@ -68,6 +70,17 @@ void MemoEditView::__createPlayer(bool withDeleteButton)
 	free(path);
 }
 
+// What the desktop's media controls call the voice memo: its title, else the app's name.
+static std::string mediaTitleOf(MemoBoxControl *boxControl)
+{
+	char *title = boxControl ? boxControl->getTitleTextN() : nullptr;
+	if (!title)
+		app_get_name(&title);
+	std::string text = title ? title : "";
+	free(title);
+	return text;
+}
+
 void MemoEditView::__showPlayer(const char *path, bool withDeleteButton)
 {
 	MemoPlayer *player = new MemoPlayer(path);
@@ -77,6 +90,7 @@ void MemoEditView::__showPlayer(const char *path, bool withDeleteButton)
 	}
 	player->__signal.addListener([this](const char *signal, const char *data) { __playerActionCb(signal, data); },
 	                             getEvasObj());
+	player->setMediaTitle(mediaTitleOf(__boxControl).c_str());
 	__player = player;
 }
 
@@ -155,6 +169,7 @@ void MemoEditView::__audioBtnCb()
 	}
 	recorder->__signal.addListener([this](const char *signal, const char *data) { __recorderActionCb(signal, data); },
 	                               getEvasObj());
+	recorder->setMediaTitle(mediaTitleOf(__boxControl).c_str());
 	__recorder = recorder;
 	if (__colorSelector)
 		elm_object_signal_emit(getEvasObj(), "show,colorselector,with,recorder", "elm");

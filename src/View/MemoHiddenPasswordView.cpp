@@ -19,10 +19,21 @@ const char LAYOUT_GROUP[] = "memo.hidden.password";
 // Two blanks as the theme has always had them.
 const char ENTRY_STYLE[] = "DEFAULT='font_size=40  font_weight=Bold color=#000000 align=center'";
 const char *const ENTRY_PARTS[] = {"entry1", "entry2", "entry3", "entry4"};
-// Keys that never count towards a PIN, whatever the entry.
-const char *const IGNORED_KEYS[] = {
-    "XF86Back", "XF86Menu", "Return", "XF86PowerOff", "XF86Home", "XF86AudioLowerVolume", "XF86AudioRaiseVolume",
-    "Cancel"};
+// Keys that never count towards a PIN, whatever the entry: the device's hardware keys, and the desktop keys
+// that stand in for back (Escape, XF86Stop) and more (Menu, F2, XF86Send).
+const char *const IGNORED_KEYS[] = {"XF86Back",
+                                    "XF86Menu",
+                                    "Return",
+                                    "XF86PowerOff",
+                                    "XF86Home",
+                                    "XF86AudioLowerVolume",
+                                    "XF86AudioRaiseVolume",
+                                    "Cancel",
+                                    "Escape",
+                                    "XF86Stop",
+                                    "Menu",
+                                    "F2",
+                                    "XF86Send"};
 } // namespace
 
 MemoHiddenPasswordView::MemoHiddenPasswordView(MemoListView *parent)

@@ -4,6 +4,8 @@
 #include <WNaviframeController.h>
 
 #include "MemoLog.h"
+#include "View/MemoSearchView.h"
+#include "View/MemoSelectionView.h"
 
 bool memoHiddenPushListPage(app_assist::WNaviframeController *naviframe, MemoHiddenListPage page, int mode)
 {
@@ -11,8 +13,10 @@ bool memoHiddenPushListPage(app_assist::WNaviframeController *naviframe, MemoHid
 		MEMO_LOGE("Naviframe is NULL");
 		return false;
 	}
-	// WAITING FOR MemoSelectionView AND MemoSearchView: the one place that pushes them for the hidden memos.
-	MEMO_LOGI("hidden memos: %s (mode %d) asked for; that view is not part of the app yet",
-	          page == MemoHiddenListPage::SELECTION ? "MemoSelectionView" : "MemoSearchView", mode);
-	return false;
+	if (page == MemoHiddenListPage::SELECTION)
+		return naviframe->push(new MemoSelectionView(mode));
+	MemoSearchView *search = new MemoSearchView();
+	// The search reads the grid mode when it is created.
+	search->gridMode = mode;
+	return naviframe->push(search);
 }

@@ -129,7 +129,16 @@ TEST_F(StoreMemo, ListsFilterAndOrder)
 	EXPECT_STREQ("228;235;235;255;", all->getItem(1)->getBgColor());
 	EXPECT_STREQ("a<b", all->getItem(1)->getTitle());
 	EXPECT_EQ(1, all->getItem(2)->getIsHidden());
+	// Reads of the same rows share their texts: a record changed, or kept past the lists and the store, is
+	// its own.
+	MemoItemList *again = db()->getAllMemoListN();
+	MemoDocInfo kept(*again->getItem(1));
+	all->getItem(1)->setTitle("changed");
+	EXPECT_STREQ("a<b", again->getItem(1)->getTitle());
 	delete all;
+	delete again;
+	MemoDbMgr::destroy();
+	EXPECT_STREQ("a<b", kept.getTitle());
 
 	// A single read does not know about hiding.
 	MemoDocInfo *one = db()->getOneMemoN(hidden.c_str());

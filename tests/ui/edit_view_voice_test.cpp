@@ -2,10 +2,13 @@
 // real time): recording, the one-second rule, calls and limits, the time text, playing, deleting, and the
 // indicator.
 #include <app_i18n.h>
+#include <desktop/minicontrol_viewer.h>
 #include <message_port.h>
 
 #include "../platform/media_fixture.h"
 #include "DataBase/MemoFileInfo.h"
+#include "Recorder/MRecorderLockScreenMiniController.h"
+#include "Recorder/MRecorderNotiMiniController.h"
 #include "Recorder/MemoPlayer.h"
 #include "Recorder/MemoRecorder.h"
 #include "box_control_fixture.h"
@@ -18,6 +21,8 @@ struct MemoRecorderTestAccess {
 	static int elapsed(MemoRecorder *r) { return r->__elapsedMs; }
 	static void status(MemoRecorder *r, unsigned long long ms) { MemoRecorder::__recordingStatusCb(ms, 0, r); }
 	static void setTimeLimit(int seconds) { MemoRecorder::__timeLimitSeconds = seconds; }
+	static MRecorderNotiMiniController *notiMini(MemoRecorder *r) { return r->__notiMini; }
+	static MRecorderLockScreenMiniController *lockMini(MemoRecorder *r) { return r->__lockMini; }
 };
 struct MemoPlayerTestAccess {
 	static player_state_e state(MemoPlayer *p) { return p->__getState(); }
@@ -172,6 +177,19 @@ TEST_F(EditViewVoice, ShortTakesAreDroppedAndPausesJoinInOneFile)
 	settle(0.5);
 	EXPECT_TRUE(isTop(view));
 	EXPECT_TRUE(voiceFiles().empty());
+
+	// Discarding a take of a second or more asks first, while the take runs on.
+	startRecording();
+	recordUntil(1000);
+	tapPart(recorder(), "recorder_cancel_btn");
+	settle(0.3);
+	ASSERT_TRUE(MemoPopupMonitor::getInstance()->isPopupAlive());
+	EXPECT_TRUE(MemoUtil::isRecorderBusy());
+	tapObject(popupButton(2));
+	settle(0.2);
+	EXPECT_FALSE(MemoUtil::isRecorderBusy());
+	EXPECT_TRUE(voiceFiles().empty());
+	EXPECT_EQ(0, livePanels());
 
 	startRecording();
 	recordUntil(1000);
@@ -332,4 +350,48 @@ TEST_F(EditViewVoice, IndicatorHearsATakeInTheBackground)
 	EXPECT_NE(std::string::npos, heard.find(" voicerecorder_indicator_data=bg_recording_start\n")) << heard;
 	EXPECT_NE(std::string::npos, heard.find(" voicerecorder_indicator_data=voicerecorder_none\n")) << heard;
 	EXPECT_LT(heard.find("bg_recording_start"), heard.find("voicerecorder_none"));
+}
+
+TEST_F(EditViewVoice, MiniControllersRunTheTakeWhileTheAppIsInTheBackground)
+{
+	view = openNew();
+	startRecording();
+	recordUntil(1200);
+	vconf_set_int(VCONFKEY_IDLE_LOCK_STATE, VCONFKEY_IDLE_LOCK);
+	MemoBroadCaster::getInstance().emit("broadcast,memo,app,pause", nullptr);
+	MRecorderNotiMiniController *noti = MemoRecorderTestAccess::notiMini(recorder());
+	MRecorderLockScreenMiniController *lock = MemoRecorderTestAccess::lockMini(recorder());
+	ASSERT_TRUE(noti && lock);
+	EXPECT_TRUE(evas_object_visible_get(minicontrol_viewer_window_find("memorecorder_mini_controller")));
+	ASSERT_TRUE(waitFor([&] { return evas_object_visible_get(lock->_win); }));
+
+	// A press in the notification panel pauses the take; the lock screen's controller follows.
+	noti->_signal.emit("recorder,resumed", nullptr);
+	recorder_state_e state = RECORDER_STATE_NONE;
+	recorder_get_state(noti->_recorder, &state);
+	EXPECT_EQ(RECORDER_STATE_PAUSED, state);
+	EXPECT_STREQ(i18n_get_text("IDS_MEMO_BODY_PAUSED_M_STATUS"),
+	             elm_object_part_text_get(lock->_layout, "recorder_status_text"));
+	lock->_signal.emit("recorder,paused", nullptr);
+	recorder_get_state(noti->_recorder, &state);
+	EXPECT_EQ(RECORDER_STATE_RECORDING, state);
+	EXPECT_STREQ(i18n_get_text("IDS_MEMO_BODY_RECORDING_ING_M_AUDIO"),
+	             elm_object_part_text_get(noti->_layout, "recorder_status_text"));
+	MemoRecorderTestAccess::status(recorder(), 3600000);
+	EXPECT_STREQ("01:00:00", elm_object_part_text_get(noti->_layout, "recorder_time_hour"));
+	EXPECT_STREQ("01:00:00", elm_object_part_text_get(lock->_layout, "recorder_time"));
+
+	// Back in the app: both go.
+	MemoBroadCaster::getInstance().emit("broadcast,memo,app,resume", nullptr);
+	EXPECT_EQ(nullptr, minicontrol_viewer_window_find("memorecorder_mini_controller"));
+	EXPECT_EQ(nullptr, minicontrol_viewer_window_find("memo-minicontrol.LOCKSCREEN"));
+
+	// Stopped from the notification panel, the take is kept and the controllers go.
+	MemoBroadCaster::getInstance().emit("broadcast,memo,app,pause", nullptr);
+	MemoRecorderTestAccess::notiMini(recorder())->_signal.emit("recorder,stopped", nullptr);
+	ASSERT_TRUE(waitFor([this] { return player() != nullptr; }));
+	EXPECT_EQ(nullptr, minicontrol_viewer_window_find("memorecorder_mini_controller"));
+	EXPECT_EQ(nullptr, minicontrol_viewer_window_find("memo-minicontrol.LOCKSCREEN"));
+	EXPECT_EQ(1u, voiceFiles().size());
+	vconf_set_int(VCONFKEY_IDLE_LOCK_STATE, VCONFKEY_IDLE_UNLOCK);
 }

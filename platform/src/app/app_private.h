@@ -188,8 +188,11 @@ void app_event_rotation_apply(void);
 
 /* ---- windows (app_window.c) ---- */
 
-/* Every top-level Elementary window of this process. The list is freed by the caller (eina_list_free). */
+/* Every top-level Elementary window of this process but the minicontrol windows, which their viewers
+   place, show and rotate. The list is freed by the caller (eina_list_free). */
 Eina_List *app_window_list_get(void);
+/* True for a window of minicontrol_create_window (ui/minicontrol.c). */
+bool app_window_is_minicontrol(Evas_Object *win);
 /* The first visible window (else the first one), or NULL. */
 Evas_Object *app_window_main_get(void);
 /* De-iconifies, raises and activates every window. */
