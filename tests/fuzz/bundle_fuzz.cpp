@@ -12,7 +12,7 @@
 namespace
 {
 // The text of a bundle; it frees the bundle.
-std::string encodedN(bundle *b)
+std::string encodeAndFree(bundle *b)
 {
 	bundle_raw *raw = nullptr;
 	int len = 0;
@@ -51,9 +51,9 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t *data, size_t size)
 	if (!b)
 		return 0;
 	bundle_foreach(b, readCb, b);
-	const std::string once = encodedN(b);
+	const std::string once = encodeAndFree(b);
 	bundle *again = bundle_decode(reinterpret_cast<const bundle_raw *>(once.data()), static_cast<int>(once.size()));
-	if (!again || encodedN(again) != once)
+	if (!again || encodeAndFree(again) != once)
 		abort();
 	return 0;
 }

@@ -38,7 +38,7 @@ bool extraCb(app_control_h request, const char *key, void *)
 }
 
 // The text of a request as a sender would write it; it frees the request.
-std::string encodedN(app_control_h request)
+std::string encodeAndFree(app_control_h request)
 {
 	bundle_raw *raw = nullptr;
 	int len = 0;
@@ -58,9 +58,9 @@ void requestCb(void *, app_message_reader_s *, const app_message_s *msg)
 	if (!request)
 		return;
 	app_control_foreach_extra_data(request, extraCb, nullptr);
-	const std::string once = encodedN(request);
+	const std::string once = encodeAndFree(request);
 	app_control_h again = app_control_decode_internal(reinterpret_cast<const bundle_raw *>(once.data()), once.size());
-	if (!again || encodedN(again) != once)
+	if (!again || encodeAndFree(again) != once)
 		abort();
 }
 } // namespace

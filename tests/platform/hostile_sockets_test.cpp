@@ -118,7 +118,7 @@ TEST_F(HostileSockets, MalformedMessagesAreRefusedAndTheAppGoesOn)
 	const char *ops[] = {"a", "b"};
 	bundle_add_str_array(wrongType, "__APP_SVC_OPERATION__", ops, 2);
 	bundle *longMime = bundle_create();
-	bundle_add_str(longMime, "__APP_SVC_MIME__", std::string(5000, 'x').c_str());
+	bundle_add_str(longMime, "__APP_SVC_MIME__", std::string(10000, 'x').c_str());
 	bundle *manyKeys = bundle_create();
 	for (int i = 0; i < 2000; ++i)
 		bundle_add_str(manyKeys, ("k" + std::to_string(i)).c_str(), "v");
@@ -128,7 +128,7 @@ TEST_F(HostileSockets, MalformedMessagesAreRefusedAndTheAppGoesOn)
 	    {frame(1, "QkRMMQ", 100), "the sender left a message unfinished"},
 	    {frame(1, "!!!!", 4), "bundle text is not valid base64"},
 	    {launchFrame(wrongType), "launch request refused: __APP_SVC_OPERATION__ is not a text"},
-	    {launchFrame(longMime), "launch request refused: __APP_SVC_MIME__ of 5000 bytes"},
+	    {launchFrame(longMime), "launch request refused: __APP_SVC_MIME__ of 10000 bytes"},
 	    {launchFrame(manyKeys), "bundle of 2000 keys refused"},
 	};
 	for (const auto &c : cases) {

@@ -106,7 +106,7 @@ void SyncSimStore::rollback()
 	sqlite3_exec(__db, "ROLLBACK", nullptr, nullptr, nullptr);
 }
 
-std::string SyncSimStore::addMemoN(const std::string &text)
+std::string SyncSimStore::addMemo(const std::string &text)
 {
 	Body body(text);
 	const std::string uuid = newUuid();

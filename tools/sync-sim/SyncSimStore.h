@@ -7,8 +7,8 @@
 struct sqlite3;
 
 // The sync service's writes to memo.db: memos that arrive from the cloud or change there, rows marked
-// as uploaded, tombstones. Each write is one statement; the caller chooses the transactions, so that a
-// sync run can hold the write lock across several of them.
+// as uploaded, tombstones. The caller chooses the transactions, so that a sync run can hold the write
+// lock across several writes.
 class SyncSimStore
 {
 public:
@@ -20,8 +20,9 @@ public:
 	bool commit();
 	void rollback();
 
-	// A new memo with the text as its one item, as a download leaves it (clean, synced); its UUID.
-	std::string addMemoN(const std::string &text);
+	// A new memo with the text as its one item, as a download leaves it (clean, synced); its UUID, or
+	// empty when the insert failed.
+	std::string addMemo(const std::string &text);
 	// The memo's body becomes the text, as a change made elsewhere.
 	bool changeMemo(const std::string &uuid, const std::string &text);
 	// The soft delete of a memo deleted elsewhere.

@@ -149,7 +149,7 @@ void say(const char *what, const std::string &uuid, const std::string &text)
 bool syncWrites(SyncSimStore &store, const Options &o, std::vector<std::pair<std::string, std::string>> &done)
 {
 	for (int i = 0; i < o.add; ++i) {
-		const std::string text = textFor(o, "added"), uuid = store.addMemoN(text);
+		const std::string text = textFor(o, "added"), uuid = store.addMemo(text);
 		if (uuid.empty())
 			return false;
 		done.emplace_back("added " + uuid, text);
@@ -229,7 +229,7 @@ void runContinuous(SyncSimStore &store, const Options &o)
 			printf("sync-sim: busy: the app held the lock\n");
 			continue;
 		}
-		const std::string uuid = adding ? store.addMemoN(text) : (store.changeMemo(target, text) ? target : "");
+		const std::string uuid = adding ? store.addMemo(text) : (store.changeMemo(target, text) ? target : "");
 		sleepFor(o.holdMs / 1000.0);
 		if (uuid.empty() || !store.commit()) {
 			store.rollback();

@@ -382,8 +382,9 @@ bool app_control_encode_internal(app_control_h app_control, const char *caller, 
 	return ok;
 }
 
-/* An operation, URI, mime type, category or app id longer than this is not a request of ours. */
-#define FIELD_MAX_LEN 4096
+/* An operation, URI (a file URI of the longest path fits), mime type, category or app id longer than this
+   is not a request of ours. */
+#define FIELD_MAX_LEN 8192
 
 /* Moves a reserved string key of b into *field; false (logged) when another process sent it as
    something other than a text, or longer than any real one. */
