@@ -5,6 +5,8 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <string_view>
+#include <unordered_map>
 #include <vector>
 
 // An immutable text that copies share. It may be null, as an SQL NULL is; c_str() then gives "".
@@ -50,7 +52,8 @@ private:
 	uintptr_t __bits; // a Block, its lowest bit set when borrowed
 };
 
-// Texts stored together and freed together, in a few large chunks.
+// Texts stored together and freed together, in a few large chunks. Short texts that repeat (colours, titles,
+// empty columns) are stored once.
 class MemoTextArena
 {
 public:
@@ -62,6 +65,9 @@ public:
 	MemoText add(const char *text);
 
 private:
+	MemoText __store(const char *text, size_t length);
+
+	std::unordered_map<std::string_view, MemoText> __short;
 	std::vector<std::unique_ptr<char[]>> __chunks;
 	size_t __used = 0;
 	size_t __size = 0;

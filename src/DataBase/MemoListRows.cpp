@@ -29,6 +29,15 @@ long long __dataVersion(sqlite3 *db)
 	return version;
 }
 
+// A text's integer as SQLite reads it: leading blanks, a sign and digits, else 0. Only a text that may start a
+// number is handed to SQLite.
+long long __integerOf(MemoSqlStmt &stmt, int column, const char *text)
+{
+	if (!text || !*text || !strchr(" \t\n\v\f\r+-0123456789", *text))
+		return 0;
+	return static_cast<long long>(stmt.u64(column));
+}
+
 Eina_Bool __dropCb(void *)
 {
 	gKept.dropper = nullptr;
@@ -49,8 +58,9 @@ MemoListRows::MemoListRows(MemoSqlStmt &stmt, int columns)
 				__rows.push_back({0, MemoText(), false});
 			} else {
 				// The text first: the integer reading of a text leaves it as it was.
-				MemoText value = __texts->add(stmt.text(c));
-				__rows.push_back({static_cast<long long>(stmt.u64(c)), std::move(value), false});
+				const char *text = stmt.text(c);
+				MemoText value = __texts->add(text);
+				__rows.push_back({__integerOf(stmt, c, text), std::move(value), false});
 			}
 		}
 	}

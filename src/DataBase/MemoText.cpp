@@ -6,6 +6,7 @@
 namespace
 {
 const size_t CHUNK_BYTES = 256 * 1024;
+const size_t SHORT_BYTES = 24;
 } // namespace
 
 MemoText::MemoText(const char *text) : MemoText(text, text ? strlen(text) : 0) {}
@@ -65,10 +66,21 @@ void MemoText::__unref()
 
 MemoText MemoTextArena::add(const char *text)
 {
-	MemoText result;
 	if (!text)
-		return result;
+		return MemoText();
 	const size_t length = strlen(text);
+	if (length > SHORT_BYTES)
+		return __store(text, length);
+	auto found = __short.find(std::string_view(text, length));
+	if (found != __short.end())
+		return found->second;
+	MemoText stored = __store(text, length);
+	__short.emplace(std::string_view(stored.c_str(), length), stored);
+	return stored;
+}
+
+MemoText MemoTextArena::__store(const char *text, size_t length)
+{
 	// Blocks stay aligned for their counter, which leaves the lowest bit of their address free.
 	const size_t bytes = (offsetof(MemoText::Block, text) + length + 1 + 7) & ~static_cast<size_t>(7);
 	if (__used + bytes > __size) {
@@ -79,7 +91,9 @@ MemoText MemoTextArena::add(const char *text)
 	char *memory = __chunks.back().get() + __used;
 	__used += bytes;
 	MemoText::Block *block = new (memory) MemoText::Block{{0}, static_cast<uint32_t>(length), {}};
-	memcpy(block->text, text, length + 1);
+	memcpy(block->text, text, length);
+	block->text[length] = '\0';
+	MemoText result;
 	result.__bits = reinterpret_cast<uintptr_t>(block) | MemoText::BORROWED;
 	return result;
 }
