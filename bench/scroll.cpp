@@ -23,7 +23,8 @@
 
 namespace
 {
-const int MEMO_COUNT = 10000;
+// MEMO_BENCH_COUNT=<n> flings through n memos instead, to see how the cost grows with the grid.
+const int MEMO_COUNT = getenv("MEMO_BENCH_COUNT") ? atoi(getenv("MEMO_BENCH_COUNT")) : 10000;
 const double FLING_SECONDS = 6.0;
 
 struct Timeline {

@@ -70,6 +70,8 @@ public:
 	// Keeps the texts that the setters below may borrow from (the rows of a list read), for the record's life.
 	// A record keeps one such arena: call this first.
 	void keepTexts(std::shared_ptr<const MemoTextArena> texts) { __texts = std::move(texts); }
+	// The rows the record was read from (null for a record made otherwise): records of equal rows are equal.
+	const std::shared_ptr<const MemoTextArena> &getTexts() const { return __texts; }
 	// The same setters for a text that the record may share with other records (a null text is refused as a
 	// null pointer is). A borrowed text must come from the arena the record keeps.
 	bool setMemoUUID(const MemoText &memoUUID);

@@ -5,12 +5,15 @@
 
 #include <Elementary.h>
 
+#include <memory>
+
 #include <WSignal.h>
 #include <WViewController.h>
 
 class MemoGridItem;
 class MemoItemList;
 class MemoDocInfo;
+class MemoTextArena;
 
 // The memo grid: one elm_gengrid with a MemoGridItem per record. The owner's grid mode (see create) picks the
 // store read; the control sizes the cells for scale and orientation, keeps the scroll position across a
@@ -62,6 +65,12 @@ private:
 	// order differs.
 	bool __reconcileSearchItems(const std::vector<MemoDocInfo *> &records, const char *keyword);
 	int __getItemType(MemoDocInfo *record);
+	// The quick memo's header and guide, written into the in-memory record before its item is built.
+	void __prepareRecord(MemoDocInfo *record);
+	// Binds the items of the last update (items, taken over) to the rows of the new list instead of building
+	// them again, when both come from the same rows of the store and nothing else differs; false otherwise.
+	bool __rebindItems(Eina_List *items);
+	void __noteItemsBuilt();
 	static void __scrollCb(void *data, Evas_Object *obj, void *eventInfo);
 	static void __pressedItemCb(void *data, Evas_Object *obj, void *eventInfo);
 
@@ -76,8 +85,15 @@ private:
 	bool __scrolledInPortrait;
 	bool __scrolledInLandscape;
 	int __scrollEventCount;
+<<<<<<< HEAD
 	// The gengrid holds the cards of a search (each with the keyword), not those of a full update.
 	bool __searchShown = false;
+=======
+	// What the items were last built from: the rows (kept while the items stand), the view kind, the orientation.
+	std::shared_ptr<const MemoTextArena> __itemsFrom;
+	int __itemsKind;
+	bool __itemsPortrait;
+>>>>>>> listperf
 
 	// Shared by every grid of the process: a new grid forgets the position of the others.
 	static int savedScrollX;

@@ -31,6 +31,8 @@ public:
 	void setViewKind(int viewKind);
 	// The row and the owner's check array (one int per row, not owned) of a selection grid.
 	void setRow(int row, int *checkStates);
+	// The same card for another record of equal content (the grid's reload of unchanged rows).
+	void rebind(MemoDocInfo *docInfo, int row, int *checkStates);
 	// The search text to highlight (copied; null or empty for none) and the gengrid whose colours it takes.
 	void setKeyword(const char *keyword, Evas_Object *grid);
 

@@ -41,7 +41,7 @@ int MemoGridControl::restoreScrollY = 0;
 MemoGridControl::MemoGridControl()
     : __checkStates(nullptr), __reservedFlag1(false), __reservedFlag2(false), __itemCount(0), __gridItems(nullptr),
       __gridMode(nullptr), __itemList(nullptr), __scrolledInPortrait(false), __scrolledInLandscape(false),
-      __scrollEventCount(0)
+      __scrollEventCount(0), __itemsKind(-1), __itemsPortrait(true)
 {
 	setName("MemoGridControl");
 }
@@ -84,6 +84,7 @@ void MemoGridControl::onDestroy()
 	__checkStates = nullptr;
 	delete __itemList;
 	__itemList = nullptr;
+	__itemsFrom.reset();
 }
 
 void MemoGridControl::updateGrid()
@@ -98,7 +99,8 @@ void MemoGridControl::updateGrid(bool keepList)
 		MEMO_LOGE("gengrid obj is NULL");
 		return;
 	}
-	__gridItems = eina_list_free(__gridItems);
+	Eina_List *previous = __gridItems;
+	__gridItems = nullptr;
 	__setGridSize(gengrid);
 	if (!keepList) {
 		MemoDbMgr *db = MemoDbMgr::getInstance();
@@ -123,10 +125,14 @@ void MemoGridControl::updateGrid(bool keepList)
 	} else {
 		__itemCount = __itemList ? __itemList->getCount() : 0;
 	}
+	if (!keepList && __rebindItems(previous))
+		return;
+	eina_list_free(previous);
 	elm_gengrid_clear(gengrid);
 	__searchShown = false;
 	for (int row = 0; row < __itemCount; ++row)
 		__appendItem(__itemList->getItem(row), row, nullptr);
+	__noteItemsBuilt();
 }
 
 void MemoGridControl::reloadItems()
@@ -135,6 +141,7 @@ void MemoGridControl::reloadItems()
 	if (getEvasObj())
 		elm_gengrid_clear(getEvasObj());
 	__searchShown = false;
+	__itemsFrom.reset();
 	delete __itemList;
 	__itemList = MemoDbMgr::getInstance()->getVisibleMemoListN();
 }
@@ -148,13 +155,7 @@ void MemoGridControl::__appendItem(MemoDocInfo *record, int row, const char *key
 {
 	if (!record)
 		return;
-	// The quick memo shows its header and, while empty, how to fill it; the store keeps its own row.
-	if (record->getIsQuick() == 1) {
-		record->setTitle(i18n_get_text("IDS_MEMO_HEADER_QUICK_MEMO"));
-		if (!*record->getDisplayContent() && !*record->getTizenXmlContent())
-			record->setDisplayContent(
-			    i18n_get_text("IDS_MEMO_BODY_COLLECT_TEXT_FROM_ANY_APP_BY_SELECTING_IT_AND_TAPPING_QUICK_MEMO_MSG"));
-	}
+	__prepareRecord(record);
 	MemoGridItem *item = new MemoGridItem(__getItemType(record), record);
 	item->setViewKind(__gridMode ? *__gridMode : -1);
 	if (keyword)
@@ -171,6 +172,17 @@ void MemoGridControl::__appendItem(MemoDocInfo *record, int row, const char *key
 	}
 	item->setElmObjectItem(objectItem);
 	__gridItems = eina_list_append(__gridItems, item);
+}
+
+void MemoGridControl::__prepareRecord(MemoDocInfo *record)
+{
+	// The quick memo shows its header and, while empty, how to fill it; the store keeps its own row.
+	if (record->getIsQuick() == 1) {
+		record->setTitle(i18n_get_text("IDS_MEMO_HEADER_QUICK_MEMO"));
+		if (!*record->getDisplayContent() && !*record->getTizenXmlContent())
+			record->setDisplayContent(
+			    i18n_get_text("IDS_MEMO_BODY_COLLECT_TEXT_FROM_ANY_APP_BY_SELECTING_IT_AND_TAPPING_QUICK_MEMO_MSG"));
+	}
 }
 
 int MemoGridControl::__getItemType(MemoDocInfo *record)

@@ -51,6 +51,7 @@ void MemoGridControl::searchGrid(const char *keyword, int *outCount)
 
 	// An empty list leaves the grid as it was.
 	if (rows >= 1) {
+		__itemsFrom.reset(); // the cards of the last update are changed or gone
 		if (!__searchShown || !__reconcileSearchItems(records, keyword)) {
 			elm_gengrid_clear(gengrid);
 			for (MemoDocInfo *record : records)

@@ -112,6 +112,12 @@ void MemoGridItem::setRow(int row, int *checkStates)
 	__checkStates = checkStates;
 }
 
+void MemoGridItem::rebind(MemoDocInfo *docInfo, int row, int *checkStates)
+{
+	__docInfo = docInfo;
+	setRow(row, checkStates);
+}
+
 void MemoGridItem::setKeyword(const char *keyword, Evas_Object *grid)
 {
 	free(__keyword);

@@ -211,6 +211,14 @@ TEST_F(GridTest, eachGridModeReadsItsRows)
 		EXPECT_EQ(value == 1 ? visible : (value == 3 ? allNormal : all), shown()) << "mode " << value;
 	}
 	EXPECT_EQ(3, grid->getItemCount());
+
+	// A reload over the same rows within one step keeps the cards, bound to the new records.
+	mode = 0;
+	grid->updateGrid();
+	Elm_Object_Item *first = elm_gengrid_first_item_get(grid->getEvasObj());
+	grid->updateGrid();
+	EXPECT_EQ(first, elm_gengrid_first_item_get(grid->getEvasObj()));
+	EXPECT_EQ(visible, shown());
 }
 
 TEST_F(GridTest, rotationKeepsTheScrollPosition)

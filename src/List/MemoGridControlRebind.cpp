@@ -1,0 +1,44 @@
+// A reload of the grid that finds the rows it was built from: the list view reads the whole list several
+// times in one step (its push, the resume, its return to the top), and the rows of those reads are one and the
+// same while the store is unchanged. Building ten thousand cards again costs more than the read itself (the
+// grid queues work for every card it adds or removes), so the cards stay and take the new records.
+#include "List/MemoGridControl.h"
+
+#include "DataBase/MemoDocInfo.h"
+#include "List/MemoGridItem.h"
+#include "List/MemoItemList.h"
+#include "MemoApp.h"
+
+void MemoGridControl::__noteItemsBuilt()
+{
+	__itemsFrom.reset();
+	if (__itemCount > 0)
+		__itemsFrom = __itemList->getItem(0)->getTexts();
+	__itemsKind = __gridMode ? *__gridMode : -1;
+	__itemsPortrait = gIsPortrait;
+}
+
+bool MemoGridControl::__rebindItems(Eina_List *items)
+{
+	// Equal rows give equal records, layout codes and texts; the view kind and the orientation choose the
+	// item class; a rebuilt grid starts at the top.
+	Evas_Coord x = 0, y = 0;
+	elm_scroller_region_get(getEvasObj(), &x, &y, nullptr, nullptr);
+	if (__itemCount <= 0 || !__itemsFrom || __itemList->getItem(0)->getTexts() != __itemsFrom ||
+	    __itemsKind != (__gridMode ? *__gridMode : -1) || __itemsPortrait != gIsPortrait || x || y ||
+	    static_cast<int>(eina_list_count(items)) != __itemCount)
+		return false;
+	int row = 0;
+	Eina_List *cell = nullptr;
+	void *data = nullptr;
+	EINA_LIST_FOREACH(items, cell, data)
+	{
+		MemoDocInfo *record = __itemList->getItem(row);
+		__prepareRecord(record);
+		static_cast<MemoGridItem *>(data)->rebind(record, row, __checkStates);
+		++row;
+	}
+	__gridItems = items;
+	elm_gengrid_realized_items_update(getEvasObj());
+	return true;
+}
