@@ -85,15 +85,12 @@ private:
 	bool __scrolledInPortrait;
 	bool __scrolledInLandscape;
 	int __scrollEventCount;
-<<<<<<< HEAD
 	// The gengrid holds the cards of a search (each with the keyword), not those of a full update.
 	bool __searchShown = false;
-=======
 	// What the items were last built from: the rows (kept while the items stand), the view kind, the orientation.
 	std::shared_ptr<const MemoTextArena> __itemsFrom;
 	int __itemsKind;
 	bool __itemsPortrait;
->>>>>>> listperf
 
 	// Shared by every grid of the process: a new grid forgets the position of the others.
 	static int savedScrollX;
