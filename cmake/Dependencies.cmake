@@ -1,5 +1,6 @@
 find_package(PkgConfig REQUIRED)
-pkg_check_modules(EFL REQUIRED elementary>=1.26 ecore-ipc ecore-file ecore-evas edje evas eina ecore ecore-imf)
+pkg_check_modules(EFL REQUIRED elementary>=1.26 ecore-ipc ecore-file ecore-evas ecore-x edje evas eina ecore ecore-imf
+	eldbus)
 # Debian's EFL .pc files name include folders that the packages do not ship (ector-1): keep the real ones.
 set(EFL_EXISTING_INCLUDE_DIRS "")
 foreach(dir ${EFL_INCLUDE_DIRS})

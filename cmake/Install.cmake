@@ -15,6 +15,16 @@ install(DIRECTORY ${PROJECT_BINARY_DIR}/platform-data/ DESTINATION ${MEMO_INSTAL
 install(FILES ${PROJECT_BINARY_DIR}/app-assist/app-assist.edj DESTINATION ${MEMO_INSTALL_ROOT}/share/app-assist)
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/res/icons/hicolor DESTINATION share/icons)
 
+# The account confirmation that a forgotten PIN needs, in a root of its own, with its PAM service file beside it.
+set(MEMO_ACCOUNT_ROOT ${MEMO_INSTALL_ROOT}/companions/veltronaccount)
+install(TARGETS companion-veltronaccount RUNTIME DESTINATION ${MEMO_ACCOUNT_ROOT}/bin)
+install(FILES ${PROJECT_SOURCE_DIR}/companions/veltronaccount/tizen-manifest.xml DESTINATION ${MEMO_ACCOUNT_ROOT})
+install(FILES ${PROJECT_SOURCE_DIR}/companions/icons/veltronaccount.png DESTINATION ${MEMO_ACCOUNT_ROOT}/shared/res)
+install(FILES ${PROJECT_SOURCE_DIR}/companions/veltronaccount/com.veltron.veltronaccount.pam
+	DESTINATION ${MEMO_ACCOUNT_ROOT}/share/pam.d RENAME com.veltron.veltronaccount)
+# PAM reads the system's services from here; an install without the right to write it leaves the copy above.
+set(MEMO_PAM_DIR /etc/pam.d CACHE PATH "Where the install step puts the PAM service of the account confirmation")
+
 # Files that name installed paths are written at install time, when the prefix is known.
 install(CODE "
 	set(MEMO_APP_ID ${MEMO_APP_ID})
@@ -22,5 +32,8 @@ install(CODE "
 	set(MEMO_SOURCE_DIR \"${PROJECT_SOURCE_DIR}\")
 	set(MEMO_STAGE_DIR \"${PROJECT_BINARY_DIR}/install-stage\")
 	set(MEMO_BUILD_ENTRY \"${TIZEN_APPS_DIR_DEFAULT}/${MEMO_APP_ID}.ini\")
+	set(MEMO_ACCOUNT_ROOT ${MEMO_ACCOUNT_ROOT})
+	set(MEMO_ACCOUNT_ENTRY \"${TIZEN_APPS_DIR_DEFAULT}/com.veltron.veltronaccount.ini\")
+	set(MEMO_PAM_DIR \"${MEMO_PAM_DIR}\")
 ")
 install(SCRIPT ${PROJECT_SOURCE_DIR}/cmake/InstallGenerated.cmake)

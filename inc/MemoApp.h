@@ -66,6 +66,8 @@ private:
 	void __fillSharedMemo(app_control_s *request, const char *operation);
 	// Text for the quick memo: into the quick memo open in the editor, else into the store; then the reply.
 	void __addQuickMemoText(app_control_s *request);
+	// Answers a quick memo request with the result (an app_control_result_e).
+	void __replyToQuickMemo(app_control_s *request, int result);
 
 	static void __bindTextDomains();
 	static char *__getResourcePathN(const char *resourceId);

@@ -26,6 +26,9 @@ static const char *const OPERATION_WIDGET_NEW = "widget_new";
 static const char *const OPERATION_WIDGET_OPEN = "widget_open";
 static const char *const OPERATION_QUICK_MEMO = "http://tizen.org/appcontrol/operation/send_text_quickmemo";
 static const char *const EXTRA_UUID = "uuid";
+// Far more than a person collects into the quick memo at once; a larger text from another program is
+// refused rather than copied into every stored form of the memo.
+static const size_t QUICK_TEXT_MAX_BYTES = 65536;
 
 static bool isOperation(const char *operation, const char *name)
 {
@@ -121,6 +124,13 @@ void MemoApp::__addQuickMemoText(app_control_s *request)
 		free(received);
 		return;
 	}
+	const size_t length = strlen(received);
+	if (length > QUICK_TEXT_MAX_BYTES) {
+		MEMO_LOGE("quick memo text of %zu bytes refused (at most %zu)", length, QUICK_TEXT_MAX_BYTES);
+		free(received);
+		__replyToQuickMemo(request, APP_CONTROL_RESULT_FAILED);
+		return;
+	}
 	char *text = MemoUtil::stripControlCharsN(received);
 	free(received);
 	if (!text)
@@ -142,13 +152,18 @@ void MemoApp::__addQuickMemoText(app_control_s *request)
 		db->addQuickMemo(text);
 	}
 
+	__replyToQuickMemo(request, APP_CONTROL_RESULT_SUCCEEDED);
+	free(text);
+}
+
+void MemoApp::__replyToQuickMemo(app_control_s *request, int result)
+{
 	app_control_h reply = nullptr;
 	int ret = app_control_create(&reply);
 	if (ret != APP_CONTROL_ERROR_NONE) {
 		MEMO_LOGE("aexpp_control_create err code: %d", ret);
 	} else {
-		app_control_reply_to_launch_request(reply, request, APP_CONTROL_RESULT_SUCCEEDED);
+		app_control_reply_to_launch_request(reply, request, static_cast<app_control_result_e>(result));
 		app_control_destroy(reply);
 	}
-	free(text);
 }

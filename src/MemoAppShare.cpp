@@ -140,6 +140,7 @@ void MemoApp::__fillSharedMemo(app_control_s *request, const char *operation)
 		WUiTimer::addIdler(
 		    [view, body](void *) {
 			    view->insertTextToBody(body.c_str());
+			    MEMO_LOGD("shared text in the body");
 			    return false;
 		    },
 		    nullptr, view->getEvasObj());

@@ -1,6 +1,8 @@
 #ifndef INC_LIST_MEMOGRIDCONTROL_H
 #define INC_LIST_MEMOGRIDCONTROL_H
 
+#include <vector>
+
 #include <Elementary.h>
 
 #include <memory>
@@ -42,6 +44,8 @@ public:
 	void restoreScrollPosition();
 	// Number of rows of the last full update.
 	int getItemCount() const { return __itemCount; }
+	// The selection flags of the last full update, one int per row (1 ticked), owned by the control.
+	int *getCheckStates() { return __checkStates; }
 	// Emits "selected" with the tapped card, 0.1 s after the tap.
 	SelectedSignal &getSelectedSignal() { return __selectedSignal; }
 
@@ -56,6 +60,10 @@ public:
 private:
 	void __setGridSize(Evas_Object *gengrid);
 	void __appendItem(MemoDocInfo *record, int row, const char *keyword);
+	// MemoGridControlSearch.cpp: turns the search grid's cards into those of `records` by deleting the others
+	// and giving the rest the keyword; false (nothing changed) when a card of records is missing or the
+	// order differs.
+	bool __reconcileSearchItems(const std::vector<MemoDocInfo *> &records, const char *keyword);
 	int __getItemType(MemoDocInfo *record);
 	// The quick memo's header and guide, written into the in-memory record before its item is built.
 	void __prepareRecord(MemoDocInfo *record);
@@ -81,6 +89,8 @@ private:
 	std::shared_ptr<const MemoTextArena> __itemsFrom;
 	int __itemsKind;
 	bool __itemsPortrait;
+	// The gengrid holds the cards of a search (each with the keyword), not those of a full update.
+	bool __searchShown = false;
 
 	// Shared by every grid of the process: a new grid forgets the position of the others.
 	static int savedScrollX;

@@ -38,6 +38,8 @@ public:
 
 	// The record; logs "__docInfo is NULL" when there is none.
 	MemoDocInfo *getDocInfo();
+	// The row of a card of a full update, -1 for a search result.
+	int getRow() const { return __row; }
 	int getItemType() const { return __itemType; }
 
 	// The gengrid's callbacks (public so that the item class can name them).

@@ -31,7 +31,7 @@ class MemoRecorder;
 // (the more menu), MemoEditViewShare.cpp (the memo sent to other apps), MemoEditViewColor.cpp (colour
 // selector), MemoEditViewImages.cpp (pictures from the gallery and camera, and handed in at launch),
 // MemoEditViewViewer.cpp (a picture opened in the image viewer), MemoEditViewAttach.cpp (the attach panel),
-// MemoEditViewVoice.cpp (what the voice panels will need).
+// MemoEditViewVoice.cpp (the recorder and player panels).
 class MemoEditView : public app_assist::WContentViewController
 {
 public:
@@ -197,18 +197,25 @@ private:
 	static void __attachPanelThreadCancelCb(void *data, Ecore_Thread *thread);
 
 	// ---- Voice (MemoEditViewVoice.cpp) ----
-	// True while a recorder holds a recording handle, that is while it records.
+	// True while a recorder holds a recording handle: from its start until it is given up.
 	bool __isRecording() const;
-	// Stops the recording for a save; false when it stayed under one second and is not kept.
+	// Done's stop of a recording: the recorder stops after 0.1 s; false when it stayed under one second and
+	// is not kept.
 	bool __stopRecording();
 	// The voice panel is free: no live player, and no recorder or a finished one.
 	bool __isVoicePanelFree() const;
 	void __deleteRecorder();
 	void __destroyPlayer();
+	// The player of the stored voice file (`__vrUUID`), with its delete button or for reading.
 	void __createPlayer(bool withDeleteButton);
+	void __showPlayer(const char *path, bool withDeleteButton);
+	void __closeVoicePanel();
 	char *__getVrPathN(const char *uuid);
 	// Opens the recorder panel.
 	void __audioBtnCb();
+	void __recorderActionCb(const char *signal, const char *data);
+	void __playerActionCb(const char *signal, const char *data);
+	void __onVoicePopup();
 
 	MemoBoxControl *__boxControl;
 	MemoPlayer *__player;

@@ -41,6 +41,11 @@ public:
 	~MemoListView() override;
 
 private:
+	// The hidden memos' pages take the list's floating button away and mark it as left, as the list does.
+	friend class MemoHiddenPasswordView;
+	friend class MemoHiddenFirstAccess;
+	friend class MemoSettingsView;
+
 	void __setNaviTitle(Elm_Object_Item *naviItem);
 	Evas_Object *__createNoContentLayout(Evas_Object *parent);
 	MemoGridControl *__createGrid(bool popAtOnce);
@@ -61,10 +66,11 @@ private:
 	// The editor on a memo, read-only, or on a new memo for a null record (MemoListViewEditor.cpp).
 	void __pushEditView(MemoDocInfo *record);
 	// Where else the list goes on (MemoListViewRoutes.cpp): the search (serving the pick request when
-	// asked), the selection for deletion, the hidden memos.
+	// asked), the selection for deletion, the hidden memos (the PIN, or its first use), the settings.
 	void __pushSearchView(bool servePick);
 	void __pushSelectionView();
 	void __pushHiddenView(bool hasPassword);
+	void __pushSettingsView();
 
 	MemoGridControl *__gridControl;
 	Evas_Object *__floatingBtn;

@@ -99,50 +99,6 @@ std::string workFileFor(const std::string &target)
 }
 } // namespace
 
-std::string memoFilterTagPath(const std::string &tag)
-{
-	const size_t href = tag.find(MEMO_ITEM_HREF_FILE);
-	if (href == std::string::npos)
-		return "";
-	const size_t start = href + strlen(MEMO_ITEM_HREF_FILE);
-	const size_t end = tag.find_first_of(" >", start);
-	return tag.substr(start, end == std::string::npos ? std::string::npos : end - start);
-}
-
-void memoFilterTagSetPath(std::string &tag, const std::string &path)
-{
-	const size_t href = tag.find(MEMO_ITEM_HREF_FILE);
-	if (href == std::string::npos)
-		return;
-	const size_t start = href + strlen(MEMO_ITEM_HREF_FILE);
-	size_t end = tag.find_first_of(" >", start);
-	if (end == std::string::npos)
-		end = tag.size();
-	tag.replace(start, end - start, path);
-}
-
-bool memoFilterTagSize(const std::string &tag, int *width, int *height)
-{
-	const size_t at = tag.find("size=");
-	if (at == std::string::npos)
-		return false;
-	return sscanf(tag.c_str() + at, "size=%dx%d", width, height) == 2;
-}
-
-void memoFilterTagSetSize(std::string &tag, int width, int height)
-{
-	const size_t at = tag.find("size=");
-	if (at == std::string::npos)
-		return;
-	const size_t start = at + strlen("size=");
-	size_t end = tag.find_first_of(" >", start);
-	if (end == std::string::npos)
-		end = tag.size();
-	char size[64];
-	snprintf(size, sizeof(size), "%dx%d", width, height);
-	tag.replace(start, end - start, size);
-}
-
 void MemoBoxItem::__getDisplayWidth(int *width, int *defaultHeight)
 {
 	if (memoBoxItemIsCheck(__type))

@@ -3,10 +3,16 @@
 
 // Scanning image tags ("<item ...></item>") inside entry markup, for the entry filter.
 
+#include <functional>
 #include <string>
 
 #define MEMO_ITEM_CLOSE "></item>"
 #define MEMO_ITEM_HREF_FILE "href=file://"
+
+// Steps 2 to 7 of the body entry filter on `text`: the markup to insert, before its pictures are taken
+// into the memo. `imageCount` is asked, only when the text holds an image tag, how many pictures the memo
+// has (-1: none); pictures over the limit go with a toast.
+std::string memoEntryFilterMarkup(const char *text, const std::function<int()> &imageCount);
 
 // The position just behind the tag that starts at tagStart: behind its "</item>", else behind its ">",
 // else the end of the text.

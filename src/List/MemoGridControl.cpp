@@ -129,55 +129,19 @@ void MemoGridControl::updateGrid(bool keepList)
 		return;
 	eina_list_free(previous);
 	elm_gengrid_clear(gengrid);
+	__searchShown = false;
 	for (int row = 0; row < __itemCount; ++row)
 		__appendItem(__itemList->getItem(row), row, nullptr);
 	__noteItemsBuilt();
 }
 
-void MemoGridControl::searchGrid(const char *keyword, int *outCount)
-{
-	Evas_Object *gengrid = getEvasObj();
-	if (!gengrid) {
-		MEMO_LOGE("gengrid obj is NULL");
-		return;
-	}
-	__setGridSize(gengrid);
-	char **uuids = nullptr;
-	int count = 0;
-	MemoDbMgr::getInstance()->getSearchReultN(keyword, &uuids, &count);
-	const int rows = __itemList ? __itemList->getCount() : 0;
-	if (rows >= 1) {
-		elm_gengrid_clear(gengrid);
-		__itemsFrom.reset(); // the items of the last update are gone
-	}
-	if (rows == count) {
-		// Every row is a match: the list's order stands.
-		for (int row = 0; row < rows; ++row)
-			__appendItem(__itemList->getItem(row), -1, keyword);
-	} else {
-		for (int i = 0; i < count; ++i) {
-			for (int row = 0; row < rows && uuids[i];) {
-				MemoDocInfo *record = __itemList->getItem(row);
-				if (record && !strcmp(record->getMemoUUID(), uuids[i])) {
-					__appendItem(record, -1, keyword);
-					free(uuids[i]);
-					uuids[i] = nullptr;
-					row += 2;
-				} else {
-					++row;
-				}
-			}
-		}
-	}
-	for (int i = 0; i < count; ++i)
-		free(uuids[i]);
-	free(uuids);
-	if (outCount)
-		*outCount = count;
-}
-
 void MemoGridControl::reloadItems()
 {
+	// The cards point into the records that go here; a search that finds no row would keep them.
+	if (getEvasObj())
+		elm_gengrid_clear(getEvasObj());
+	__searchShown = false;
+	__itemsFrom.reset();
 	delete __itemList;
 	__itemList = MemoDbMgr::getInstance()->getVisibleMemoListN();
 }

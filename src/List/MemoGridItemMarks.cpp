@@ -50,6 +50,9 @@ Evas_Object *MemoGridItem::__createSurface(Evas_Object *grid)
 Evas_Object *MemoGridItem::__createSelectionCheck(Evas_Object *grid)
 {
 	Evas_Object *check = elm_check_add(grid);
+	elm_object_style_set(check, "memo_select");
+	// A tap on the check is a tap on the card, which the selection view counts.
+	elm_object_signal_emit(check, "elm,event,pass,enabled", "elm");
 	for (const auto &replacement : CHECK_COLOR_REPLACEMENTS)
 		uxt_theme_object_replace_color(check, replacement[0], replacement[1]);
 	int *state = (__checkStates && __row >= 0) ? &__checkStates[__row] : nullptr;

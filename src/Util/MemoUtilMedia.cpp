@@ -3,9 +3,7 @@
 
 #include <feedback.h>
 
-#if __has_include(<recorder.h>)
-#include <recorder.h>
-#endif
+#include <recorder_product.h>
 
 void MemoUtil::playTapFeedback()
 {
@@ -16,15 +14,10 @@ void MemoUtil::playTapFeedback()
 
 bool MemoUtil::isRecorderBusy()
 {
-#ifdef RECORDER_IS_IN_RECORDING_AVAILABLE
 	// Audio recorders first, then video ones.
 	bool value = false;
 	recorder_is_in_recording(0, &value);
 	if (!value)
 		recorder_is_in_recording(1, &value);
 	return value;
-#else
-	// A platform without the query has no other recorder to ask about.
-	return false;
-#endif
 }

@@ -138,7 +138,9 @@ void MemoEditView::__createMoreMenu(bool keypadWasOpen)
 				__closeColorSelector(false);
 			__imageBtnCb();
 		});
-	if (__isVoicePanelFree() && !MemoUtil::getCallStatus() && !MemoUtil::isRecorderBusy())
+	// No recording during a call or in power saving, and one at a time.
+	if (__isVoicePanelFree() && !MemoUtil::getCallStatus() && !MemoUtil::isRecorderBusy() &&
+	    !MemoUtil::isPowerSavingMode())
 		menu->appendItem(i18n_get_text("IDS_MEMO_OPT_RECORD_AUDIO_ABB2"),
 		                 [this, keypadWasOpen]() { __onRecordMenuItem(keypadWasOpen); });
 	if (MemoUtil::isQuickMemoFeatureEnabled() && !__colorSelector && !isQuick)

@@ -15,6 +15,7 @@
 #include "DataBase/MemoDbMgr.h"
 #include "DataBase/MemoDocInfo.h"
 #include "MemoLog.h"
+#include "Recorder/MemoRecorder.h"
 #include "Util/MemoUtil.h"
 
 using app_assist::WUiTimer;
@@ -242,7 +243,8 @@ void MemoEditView::saveOnExit()
 	if (__mode == MODE_VIEW)
 		return;
 	if (__isRecorderDeleted == 0 && __recorder && __isRecording()) {
-		__stopRecording();
+		// At once: the memo is written right after.
+		__recorder->recorderStop();
 		notification_status_message_post(i18n_get_text("IDS_MEMO_TPOP_RECORDING_SAVED"));
 	}
 	// No change test: an untouched edit is written too, with a new stamp.

@@ -131,6 +131,14 @@ void MemoListView::__moreBtnSelectCb(void *data, Evas_Object *obj, void *eventIn
 		menu->appendItem(i18n_get_text("IDS_MEMO_BUTTON_DELETE"), [self] { self->__pushSelectionView(); });
 		menu->appendItem(i18n_get_text("IDS_MEMO_OPT_SEARCH"), [self] { self->__pushSearchView(false); });
 	}
+	if (!self->__isPickMode) {
+		// Offered even when every memo is hidden: the hidden memos are the way back to them.
+		menu->appendItem(i18n_get_text("IDS_MEMO_OPT_HIDDEN_MEMOS"), [self] {
+			int gesture[2] = {0, 0};
+			self->__openHiddenMemos(gesture);
+		});
+		menu->appendItem(i18n_get_text("IDS_MEMO_OPT_SETTINGS"), [self] { self->__pushSettingsView(); });
+	}
 	menu->showMenu();
 	self->attachPopup(menu);
 }

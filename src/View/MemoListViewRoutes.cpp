@@ -1,32 +1,69 @@
-// The list's ways to the search, the selection and the hidden memos, and the account settings that the
-// hidden memos need; the views behind them come with their own work.
+// The list's ways to the search, the selection, the hidden memos and the settings, and the account settings that
+// the hidden memos need.
 #include "View/MemoListView.h"
 
 #include <app_control.h>
 
+#include <WNaviframeController.h>
+
 #include "DataBase/MemoDbMgr.h"
 #include "MemoLog.h"
 #include "Util/MemoUtil.h"
+#include "View/MemoSearchView.h"
+#include "View/MemoSelectionView.h"
+#include "View/MemoHiddenFirstAccess.h"
+#include "View/MemoHiddenPasswordView.h"
+#include "View/MemoSettingsView.h"
 
 namespace
 {
 const int HIDDEN_GESTURE_LIMIT = 76;
-const int HIDDEN_PASSWORD_SIZE = 256;
 } // namespace
 
+// The search serves the list's own pick request when asked to, so a tap there answers the requester.
 void MemoListView::__pushSearchView(bool servePick)
 {
-	MEMO_LOGI("Search chosen%s: no search view yet", servePick ? " to pick" : "");
+	app_assist::WNaviframeController *naviframe = getNaviframeController();
+	if (!naviframe)
+		return;
+	__hideFloatingButton();
+	__isTopView = false;
+	naviframe->push(new MemoSearchView(), nullptr, servePick ? &__pickRequest : nullptr);
 }
 
 void MemoListView::__pushSelectionView()
 {
-	MEMO_LOGI("Delete chosen: no selection view yet");
+	app_assist::WNaviframeController *naviframe = getNaviframeController();
+	if (!naviframe)
+		return;
+	__hideFloatingButton();
+	__isTopView = false;
+	naviframe->push(new MemoSelectionView(0));
 }
 
 void MemoListView::__pushHiddenView(bool hasPassword)
 {
-	MEMO_LOGI("hidden memos asked for (%s): no hidden memo view yet", hasPassword ? "PIN set" : "first access");
+	app_assist::WNaviframeController *naviframe = getNaviframeController();
+	if (!naviframe) {
+		MEMO_LOGE("Naviframe is NULL");
+		return;
+	}
+	if (hasPassword)
+		naviframe->push(new MemoHiddenPasswordView(this));
+	else
+		naviframe->push(new MemoHiddenFirstAccess(this));
+}
+
+void MemoListView::__pushSettingsView()
+{
+	app_assist::WNaviframeController *naviframe = getNaviframeController();
+	if (!naviframe) {
+		MEMO_LOGE("Naviframe is NULL");
+		return;
+	}
+	__hideFloatingButton();
+	__isTopView = false;
+	naviframe->push(new MemoSettingsView(this));
 }
 
 bool MemoListView::__openHiddenMemos(void *event)
@@ -36,7 +73,7 @@ bool MemoListView::__openHiddenMemos(void *event)
 		return true;
 	__hideFloatingButton();
 	__isTopView = false;
-	char password[HIDDEN_PASSWORD_SIZE] = {};
+	char password[MemoHiddenPasswordView::PIN_DIGEST_BUFFER_SIZE] = {};
 	__pushHiddenView(MemoDbMgr::getInstance()->getHiddenMemoPassword(password));
 	return true;
 }

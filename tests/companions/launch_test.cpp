@@ -8,6 +8,7 @@
 #include <app_control.h>
 #include <app_manager.h>
 #include <image_util.h>
+#include <vconf.h>
 
 #include <cstdlib>
 #include <fstream>
@@ -279,4 +280,36 @@ TEST_F(Companions, ShareTargetsSaveMailAndCopyTheSharedTextAndFiles)
 	std::string clip;
 	EXPECT_EQ(0, memo_test::runCommand("xvfb-run -a sh '" + script + "'", &clip)) << clip;
 	EXPECT_EQ("Groceries\nmilk\nfile://" + pictures + "/my%20beach.jpg", clip);
+}
+
+TEST_F(Companions, AccountConfirmationAnswersByTheDesktopPassword)
+{
+	const char *const ACCOUNT = "com.veltron.veltronaccount";
+	const char *const CONFIRM = "http://tizen.org/appcontrol/operation/confirmpassword";
+	used.push_back(ACCOUNT);
+	setenv("VELTRON_ACCOUNT_TEST_PASSWORD", "s3cret", 1);
+	setenv("COMPANION_TEST_TYPE", "s3cret", 1);
+	setenv("COMPANION_TEST_CLICK", "OK", 1);
+	// No account signed in: nothing to confirm, whatever the password.
+	vconf_unset("db/desktop/account/list");
+	Reply r = launch(CONFIRM, {ACCOUNT, "", "", {{"service_category", "account_verify"}}, {}});
+	EXPECT_EQ(APP_CONTROL_RESULT_FAILED, r.result);
+	EXPECT_EQ(std::vector<std::string>{"No account is signed in"}, r.extras["errorMessage"]);
+	ASSERT_TRUE(gone(ACCOUNT));
+
+	vconf_set_str("db/desktop/account/list", "com.veltron.veltronaccount|alice|alice@example.com");
+	setenv("COMPANION_TEST_TYPE", "guess", 1);
+	r = launch(CONFIRM, {ACCOUNT, "", "", {}, {}});
+	EXPECT_EQ(APP_CONTROL_RESULT_FAILED, r.result);
+	EXPECT_EQ(std::vector<std::string>{"Authentication failure"}, r.extras["errorMessage"]);
+	ASSERT_TRUE(gone(ACCOUNT));
+	// The operation alone finds it in the registry.
+	setenv("COMPANION_TEST_TYPE", "s3cret", 1);
+	EXPECT_EQ(APP_CONTROL_RESULT_SUCCEEDED, launch(CONFIRM, {}).result);
+	ASSERT_TRUE(gone(ACCOUNT));
+	setenv("COMPANION_TEST_CLICK", "Cancel", 1);
+	EXPECT_EQ(APP_CONTROL_RESULT_CANCELED, launch(CONFIRM, {ACCOUNT, "", "", {}, {}}).result);
+	vconf_unset("db/desktop/account/list");
+	unsetenv("VELTRON_ACCOUNT_TEST_PASSWORD");
+	unsetenv("COMPANION_TEST_TYPE");
 }

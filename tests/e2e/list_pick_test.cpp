@@ -37,11 +37,15 @@ std::string takeN(char *text)
 	return result;
 }
 
-// The app of one run: once the first request has put the list on screen, taps the card of `uuid`.
+// The app of one run: once the first request has put the list on screen, taps the card of `uuid`; with a
+// query, first opens the search from the more menu and types the query into its field.
 class PickingApp : public MemoApp
 {
 public:
-	PickingApp(std::string uuid, std::string launcherOut) : __uuid(std::move(uuid)), __out(std::move(launcherOut)) {}
+	PickingApp(std::string uuid, std::string launcherOut, std::string query = "")
+	    : __uuid(std::move(uuid)), __out(std::move(launcherOut)), __query(std::move(query))
+	{
+	}
 	~PickingApp() override
 	{
 		if (__timer)
@@ -63,7 +67,7 @@ public:
 		app_control_get_operation(request, &operation);
 		pickedFirst = firstLaunch && operation && std::string(operation) == PICK;
 		free(operation);
-		__timer = ecore_timer_add(0.2, __tapCb, this);
+		__timer = ecore_timer_add(0.2, __stepCb, this);
 	}
 
 	// The platform ends its connections right after the loop: a reply sent on the way out can reach the
@@ -78,44 +82,92 @@ public:
 	bool pickedFirst = false;
 	bool floatingButtonSeen = false;
 	bool tapped = false;
+	bool searched = false;
 
 private:
-	static Eina_Bool __tapCb(void *data)
+	static Eina_Bool __stepCb(void *data)
 	{
 		PickingApp *self = static_cast<PickingApp *>(data);
 		self->__timer = nullptr;
-		self->__tapCard();
+		const double next = self->__step();
+		if (next > 0)
+			self->__timer = ecore_timer_add(next, __stepCb, self);
 		return ECORE_CALLBACK_CANCEL;
 	}
 
-	void __tapCard()
+	// One step of the run; returns the wait before the next one, 0 at the end.
+	double __step()
 	{
 		app_assist::WWindowController *window = getWindowController();
 		auto *naviframe = dynamic_cast<app_assist::WNaviframeController *>(window->getBaseViewController());
-		auto *list = dynamic_cast<MemoListView *>(naviframe->getTopContentViewController());
-		ASSERT_NE(nullptr, list);
-		Evas_Object *base = window->getBaseLayoutEvasObj();
-		floatingButtonSeen = elm_object_part_content_get(base, "elm.swallow.floatingbutton") != nullptr;
-		Evas_Object *grid = elm_object_part_content_get(list->getEvasObj(), "contents");
+		app_assist::WContentViewController *top = naviframe->getTopContentViewController();
+		Evas *evas = evas_object_evas_get(window->getEvasObj());
+		switch (__stepIndex++) {
+		case 0:
+			floatingButtonSeen =
+			    elm_object_part_content_get(window->getBaseLayoutEvasObj(), "elm.swallow.floatingbutton") != nullptr;
+			if (!__query.empty()) {
+				evas_event_feed_key_down(evas, "F2", "F2", nullptr, nullptr, 10, nullptr);
+				evas_event_feed_key_up(evas, "F2", "F2", nullptr, nullptr, 11, nullptr);
+				return 0.3;
+			}
+			__stepIndex = 3;
+			return __step();
+		case 1: {
+			// The menu's rows are those of a list inside it.
+			Evas_Object *menu = top->getPopup() ? elm_object_content_get(top->getPopup()->getEvasObj()) : nullptr;
+			Elm_Object_Item *row = menu ? elm_list_last_item_get(menu) : nullptr;
+			if (row) {
+				__tapAt(evas, elm_object_item_track(row));
+				elm_object_item_untrack(row);
+			}
+			return 0.6;
+		}
+		case 2: {
+			Evas_Object *bar = elm_object_item_part_content_get(top->getNaviItem(), "title");
+			Evas_Object *entry = bar ? elm_object_part_content_get(bar, "elm.swallow.searchbar") : nullptr;
+			searched = entry != nullptr;
+			evas_focus_in(evas);
+			elm_object_focus_set(entry, EINA_TRUE);
+			for (char c : __query) {
+				const char key[2] = {c, '\0'};
+				evas_event_feed_key_down(evas, key, key, key, key, 20, nullptr);
+				evas_event_feed_key_up(evas, key, key, key, key, 21, nullptr);
+			}
+			return 0.3;
+		}
+		default:
+			__tapCard(elm_object_part_content_get(top->getEvasObj(), "contents"));
+			return 0;
+		}
+	}
+
+	void __tapCard(Evas_Object *grid)
+	{
 		for (Elm_Object_Item *item = elm_gengrid_first_item_get(grid); item; item = elm_gengrid_item_next_get(item)) {
 			auto *card = static_cast<MemoGridItem *>(elm_object_item_data_get(item));
 			if (!card || __uuid != card->getDocInfo()->getMemoUUID())
 				continue;
-			Evas_Object *track = elm_object_item_track(item);
-			int x, y, w, h;
-			evas_object_geometry_get(track, &x, &y, &w, &h);
+			__tapAt(evas_object_evas_get(grid), elm_object_item_track(item));
 			elm_object_item_untrack(item);
-			Evas *evas = evas_object_evas_get(grid);
-			evas_event_feed_mouse_move(evas, x + w / 2, y + h / 2, 100, nullptr);
-			evas_event_feed_mouse_down(evas, 1, EVAS_BUTTON_NONE, 101, nullptr);
-			evas_event_feed_mouse_up(evas, 1, EVAS_BUTTON_NONE, 102, nullptr);
 			tapped = true;
 			return;
 		}
 	}
 
+	static void __tapAt(Evas *evas, Evas_Object *target)
+	{
+		int x, y, w, h;
+		evas_object_geometry_get(target, &x, &y, &w, &h);
+		evas_event_feed_mouse_move(evas, x + w / 2, y + h / 2, 100, nullptr);
+		evas_event_feed_mouse_down(evas, 1, EVAS_BUTTON_NONE, 101, nullptr);
+		evas_event_feed_mouse_up(evas, 1, EVAS_BUTTON_NONE, 102, nullptr);
+	}
+
 	std::string __uuid;
 	std::string __out;
+	std::string __query;
+	int __stepIndex = 0;
 	Ecore_Timer *__timer = nullptr;
 };
 
@@ -164,16 +216,17 @@ protected:
 	}
 
 	// Runs the app until the pick has been answered and the app has ended; returns the launcher's output.
-	std::string pick(const std::string &uuid)
+	std::string pick(const std::string &uuid, const std::string &query = "")
 	{
 		std::string out = memo_test::makeTempDir("pick") + "/launcher.txt";
 		setenv("TIZEN_APP_LAUNCH_WAIT", "1", 1);
 		static char arg0[] = "memo";
 		static char *argv[] = {arg0, nullptr};
 		{
-			PickingApp app(uuid, out);
+			PickingApp app(uuid, out, query);
 			EXPECT_EQ(APP_ERROR_NONE, app.start(1, argv));
 			EXPECT_TRUE(app.pickedFirst);
+			EXPECT_EQ(!query.empty(), app.searched);
 			EXPECT_TRUE(app.tapped);
 			EXPECT_FALSE(app.floatingButtonSeen);
 		}
@@ -225,6 +278,11 @@ TEST_F(ListPickTest, pickAnswersWithTextAndSharedCopiesThatLaterPicksReuse)
 	reply = pick(plain);
 	EXPECT_NE(std::string::npos, reply.find("Plain\nShopping[ ]milk")) << reply;
 	EXPECT_EQ(std::string::npos, reply.find(PATH_KEY));
+
+	// A search in the pick answers the same request.
+	reply = pick(plain, "lai");
+	EXPECT_NE(std::string::npos, reply.find("result=succeeded")) << reply;
+	EXPECT_NE(std::string::npos, reply.find("Plain\nShopping[ ]milk")) << reply;
 }
 
 } // namespace

@@ -1,6 +1,9 @@
 // Fuzz target: arbitrary bytes as a stored todolist document, as quick memo text, and as entry
 // markup. Besides not crashing, every document the code writes must be well-formed, and the
 // editor's document must survive its own round trip.
+// fuzz-sources: memo-converter/src/*.cpp src/Box/MemoTodoListReader.cpp src/Box/MemoTodoListWriter.cpp
+// fuzz-sources: src/Box/MemoContentMarkup.cpp src/Util/MemoUtilText.cpp
+// fuzz-pkgs: libxml-2.0
 #include "Box/MemoContentMarkup.h"
 #include "Box/MemoTodoListDocument.h"
 #include "MemoCvt.h"

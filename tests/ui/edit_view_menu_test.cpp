@@ -33,8 +33,8 @@ TEST_F(EditViewMenu, RowsFollowTheModePowerSavingAndTheQuickMemo)
 	           "IDS_MEMO_OPT_CHANGE_MEMO_COLOUR_ABB"});
 	EXPECT_EQ(editing, openMenu());
 	pressKey("Escape");
-	vconf_set_int("db/setting/psmode", 1); // no pictures in power saving
-	EXPECT_EQ(std::vector<std::string>({editing[0], editing[2], editing[3]}), openMenu());
+	vconf_set_int("db/setting/psmode", 1); // no pictures and no recording in power saving
+	EXPECT_EQ(std::vector<std::string>({editing[0], editing[3]}), openMenu());
 	pressKey("Escape");
 	vconf_set_int("db/setting/psmode", 0);
 

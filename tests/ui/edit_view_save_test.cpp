@@ -1,6 +1,5 @@
 // Saving from the edit view: what Done writes, what it refuses, and the save at application exit.
 #include <app_i18n.h>
-#include <csignal>
 
 #include "TestEnv.h"
 #include "box_control_fixture.h"
@@ -13,20 +12,6 @@ namespace
 const char *const STORAGE_KEY = "db/desktop/storage/internal_free_bytes";
 
 using EditViewSave = EditViewFixture;
-
-// Starts a process that holds a write lock on memo.db; its pid once it holds it, or -1.
-pid_t holdLock(int seconds)
-{
-	const std::string ready = memo_test::makeTempDir("lock") + "/ready";
-	std::string pid;
-	memo_test::runCommand(memo_test::helperPath("test_dblock") + " '" + MemoUtil::getDataPath() + "memo.db' " +
-	                          std::to_string(seconds) + " '" + ready + "' >/dev/null 2>&1 & echo $!",
-	                      &pid);
-	if (memo_test::pump(10.0, [&] { return ecore_file_exists(ready.c_str()) == EINA_TRUE; }))
-		return atoi(pid.c_str());
-	kill(atoi(pid.c_str()), SIGKILL);
-	return -1;
-}
 } // namespace
 
 TEST_F(EditViewSave, NewMemoSavedByDoneIsOneRowWithEveryFormAndItsPicture)
@@ -98,27 +83,6 @@ TEST_F(EditViewSave, FullStorageStopsDoneWithItsPopupUntilThereIsRoom)
 	pressDone(view);
 	ASSERT_TRUE(waitFor([this] { return lastPagePopped; }));
 	EXPECT_EQ(1, memoWrites());
-}
-
-// The sync service keeping the store locked past the busy handler's ten seconds.
-TEST_F(EditViewSave, LockedStoreKeepsTheEditorAndDoneSavesOnceItIsFree)
-{
-	MemoEditView *view = openNew();
-	typeInto(items(view)[1], "locked out");
-	const pid_t holder = holdLock(15);
-	ASSERT_GT(holder, 0);
-	desktop_toast_log_clear();
-	pressDone(view);
-	EXPECT_TRUE(waitFor([] { return desktop_toast_log_count() > 0; }, 15.0));
-	kill(holder, SIGTERM);
-	EXPECT_STREQ(i18n_get_text("IDS_MEMO_TPOP_UNABLE_TO_SAVE_MEMO_TRY_AGAIN"), desktop_toast_log_get(0));
-	EXPECT_TRUE(isTop(view));
-	EXPECT_EQ("locked out", textOf(entryOf(items(view)[1])));
-
-	settle(0.5);
-	pressDone(view);
-	ASSERT_TRUE(waitFor([this] { return lastPagePopped; }));
-	EXPECT_EQ("locked out", query("SELECT content FROM memo WHERE isQuick = 0"));
 }
 
 TEST_F(EditViewSave, EndingTheAppSavesTheOpenEdit)

@@ -165,9 +165,24 @@ static bool socket_dir_make(const struct sockaddr_un *addr)
 	char *slash = dir ? strrchr(dir, '/') : NULL;
 	if (slash)
 		*slash = '\0';
-	bool have_dir = slash && app_paths_mkdir_p(dir);
+	bool have_dir = slash && app_paths_mkdir_p(dir) && app_paths_dir_is_private(dir);
 	free(dir);
 	return have_dir;
+}
+
+bool app_channel_peer_allowed(int fd)
+{
+	struct ucred cred;
+	socklen_t len = sizeof(cred);
+	if (getsockopt(fd, SOL_SOCKET, SO_PEERCRED, &cred, &len) != 0) {
+		LOGE("a connection without credentials refused (%s)", strerror(errno));
+		return false;
+	}
+	if (cred.uid != geteuid()) {
+		LOGE("a connection from user %u (pid %d) refused", (unsigned int)cred.uid, (int)cred.pid);
+		return false;
+	}
+	return true;
 }
 
 int app_channel_listen(const char *app_id)

@@ -382,15 +382,30 @@ bool app_control_encode_internal(app_control_h app_control, const char *caller, 
 	return ok;
 }
 
-/* Moves a reserved string key of b into *field. */
-static void take_field(bundle *b, const char *key, char **field)
+/* An operation, URI (a file URI of the longest path fits), mime type, category or app id longer than this
+   is not a request of ours. */
+#define FIELD_MAX_LEN 8192
+
+/* Moves a reserved string key of b into *field; false (logged) when another process sent it as
+   something other than a text, or longer than any real one. */
+static bool take_field(bundle *b, const char *key, char **field)
 {
+	int type = bundle_get_type(b, key);
+	if (type == BUNDLE_TYPE_NONE)
+		return true;
 	char *s = NULL;
-	if (bundle_get_str(b, key, &s) == BUNDLE_ERROR_NONE && s) {
-		free(*field);
-		*field = strdup(s);
+	if (type != BUNDLE_TYPE_STR || bundle_get_str(b, key, &s) != BUNDLE_ERROR_NONE || !s) {
+		LOGE("launch request refused: %s is not a text", key);
+		return false;
 	}
+	if (strlen(s) > FIELD_MAX_LEN) {
+		LOGE("launch request refused: %s of %zu bytes", key, strlen(s));
+		return false;
+	}
+	free(*field);
+	*field = strdup(s);
 	bundle_del(b, key);
+	return true;
 }
 
 app_control_h app_control_decode_internal(const bundle_raw *raw, int len)
@@ -403,15 +418,18 @@ app_control_h app_control_decode_internal(const bundle_raw *raw, int len)
 		bundle_free(b);
 		return NULL;
 	}
-	take_field(b, KEY_OPERATION, &h->operation);
-	take_field(b, KEY_URI, &h->uri);
-	take_field(b, KEY_MIME, &h->mime);
-	take_field(b, KEY_CATEGORY, &h->category);
-	take_field(b, KEY_APP_ID, &h->app_id);
-	take_field(b, KEY_CALLER, &h->caller);
 	char *mode = NULL, *reply = NULL;
-	take_field(b, KEY_LAUNCH_MODE, &mode);
-	take_field(b, KEY_REPLY, &reply);
+	bool ok = take_field(b, KEY_OPERATION, &h->operation) && take_field(b, KEY_URI, &h->uri) &&
+	          take_field(b, KEY_MIME, &h->mime) && take_field(b, KEY_CATEGORY, &h->category) &&
+	          take_field(b, KEY_APP_ID, &h->app_id) && take_field(b, KEY_CALLER, &h->caller) &&
+	          take_field(b, KEY_LAUNCH_MODE, &mode) && take_field(b, KEY_REPLY, &reply);
+	if (!ok) {
+		free(mode);
+		free(reply);
+		bundle_free(b);
+		app_control_destroy(h);
+		return NULL;
+	}
 	h->launch_mode = mode && !strcmp(mode, "group") ? APP_CONTROL_LAUNCH_MODE_GROUP : APP_CONTROL_LAUNCH_MODE_SINGLE;
 	h->reply_requested = reply && !strcmp(reply, "1");
 	free(mode);

@@ -13,8 +13,9 @@
 #include <unistd.h>
 
 #define FRAME_MAGIC 0x54415050u /* "TAPP" */
-/* Far above any request; a larger size means the stream is not ours. */
-#define FRAME_MAX_SIZE (64 << 20)
+/* Far above any request (texts are cut to a few thousand characters, files go by path); a larger
+   message is refused before any of it is buffered, so a hostile sender cannot make us hold more. */
+#define FRAME_MAX_SIZE (8 << 20)
 #define READ_CHUNK 65536
 
 typedef struct {
@@ -109,8 +110,13 @@ static bool reader_dispatch(app_message_reader_s *r)
 	while (r->len - used >= sizeof(frame_header_s)) {
 		frame_header_s header;
 		memcpy(&header, r->buf + used, sizeof(header));
-		if (header.magic != FRAME_MAGIC || header.size > FRAME_MAX_SIZE) {
+		if (header.magic != FRAME_MAGIC) {
 			LOGE("a stream that is not made of launch messages: connection dropped");
+			ok = false;
+			break;
+		}
+		if (header.size > FRAME_MAX_SIZE) {
+			LOGE("a message of %u bytes refused (at most %d): connection dropped", header.size, FRAME_MAX_SIZE);
 			ok = false;
 			break;
 		}

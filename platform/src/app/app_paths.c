@@ -4,6 +4,7 @@
 
 #include "app_private.h"
 
+#include <dlog.h>
 #include <errno.h>
 #include <libgen.h>
 #include <limits.h>
@@ -160,6 +161,24 @@ bool app_paths_mkdir_p(const char *path)
 	return stat(buf, &st) == 0 && S_ISDIR(st.st_mode);
 }
 
+bool app_paths_dir_is_private(const char *dir)
+{
+	struct stat st;
+	if (lstat(dir, &st) != 0 || !S_ISDIR(st.st_mode)) {
+		LOGE("%s is not a folder: refused", dir);
+		return false;
+	}
+	if (st.st_uid != geteuid()) {
+		LOGE("%s belongs to user %u: refused", dir, (unsigned int)st.st_uid);
+		return false;
+	}
+	if ((st.st_mode & 0077) && chmod(dir, 0700) != 0) {
+		LOGE("%s is open to other users and cannot be closed (%s)", dir, strerror(errno));
+		return false;
+	}
+	return true;
+}
+
 char *app_paths_runtime_dir_get(void)
 {
 	const char *rt = getenv("XDG_RUNTIME_DIR");
@@ -168,7 +187,7 @@ char *app_paths_runtime_dir_get(void)
 		snprintf(dir, sizeof(dir), "%s/tizen-apps", rt);
 	else
 		snprintf(dir, sizeof(dir), "/tmp/tizen-apps-%u", (unsigned int)getuid());
-	return app_paths_mkdir_p(dir) ? strdup(dir) : NULL;
+	return app_paths_mkdir_p(dir) && app_paths_dir_is_private(dir) ? strdup(dir) : NULL;
 }
 
 /* "<a><b>/" with a single trailing slash, or NULL. */

@@ -20,6 +20,9 @@ extern "C" {
 char *app_paths_app_id_get(void);
 /* Creates every missing folder of path (mode 0700); true when it exists afterwards. Never logs. */
 bool app_paths_mkdir_p(const char *path);
+/* True when the folder belongs to this user and only this user may open it: a looser mode is mended,
+   another user's folder is refused. Logs a refusal. */
+bool app_paths_dir_is_private(const char *dir);
 /* Folder of per-user run-time files (pid files, logs of started apps), created; malloc'ed, no trailing "/". */
 char *app_paths_runtime_dir_get(void);
 /* Label and icon of the manifest beside the executable, malloc'ed, or NULL. */
@@ -144,6 +147,8 @@ char *app_channel_port_id_get(const char *app_id, const char *port);
 /* Listens on a message port's socket (non-blocking); -1 when another process listens there. */
 int app_channel_port_listen(const char *port_id);
 void app_channel_port_unlisten(const char *port_id, int fd);
+/* True when the process at the other end of a connected socket runs as this user; logs a refusal. */
+bool app_channel_peer_allowed(int fd);
 /* Pid of the process that owns app_id's launch socket, or -1. */
 pid_t app_channel_owner_pid(const char *app_id);
 /* Asks a running app to bring its windows to the front; APP_CONTROL_ERROR_* (APP_NOT_FOUND if not running). */
@@ -183,8 +188,11 @@ void app_event_rotation_apply(void);
 
 /* ---- windows (app_window.c) ---- */
 
-/* Every top-level Elementary window of this process. The list is freed by the caller (eina_list_free). */
+/* Every top-level Elementary window of this process but the minicontrol windows, which their viewers
+   place, show and rotate. The list is freed by the caller (eina_list_free). */
 Eina_List *app_window_list_get(void);
+/* True for a window of minicontrol_create_window (ui/minicontrol.c). */
+bool app_window_is_minicontrol(Evas_Object *win);
 /* The first visible window (else the first one), or NULL. */
 Evas_Object *app_window_main_get(void);
 /* De-iconifies, raises and activates every window. */

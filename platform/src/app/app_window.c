@@ -15,7 +15,7 @@ Eina_List *app_window_list_get(void)
 		/* Elementary marks the canvas of each window with the window object. A deleted window keeps
 		   its canvas until the next loop iteration: it must not be hooked, raised or rotated. */
 		Evas_Object *win = ecore_evas_data_get(ee, "elm_win");
-		if (win && !efl_invalidating_get(win) && !efl_invalidated_get(win))
+		if (win && !efl_invalidating_get(win) && !efl_invalidated_get(win) && !app_window_is_minicontrol(win))
 			windows = eina_list_append(windows, win);
 	}
 	return windows;

@@ -351,6 +351,12 @@ int bundle_free_encoded_rawdata(bundle_raw **r)
 	return BUNDLE_ERROR_NONE;
 }
 
+/* Bounds of a decoded bundle: text from another process never makes us allocate or search without end
+   (keys are looked up one by one, so their number is what a hostile sender would inflate). */
+#define DECODE_MAX_KEYS 1024
+#define DECODE_MAX_KEY_LEN 1024
+#define DECODE_MAX_ELEMENTS 65536
+
 /* Reads one keyval record; false on malformed input. */
 static bool decode_record(bundle_reader_s *rd, bundle *b)
 {
@@ -361,6 +367,10 @@ static bool decode_record(bundle_reader_s *rd, bundle *b)
 		return false;
 	if (key_len == 0 || memchr(key, '\0', key_len) || count > rd->size)
 		return false;
+	if (key_len > DECODE_MAX_KEY_LEN || count > DECODE_MAX_ELEMENTS) {
+		LOGE("bundle record refused: key of %zu bytes, %u elements", key_len, count);
+		return false;
+	}
 	bool scalar = type == BUNDLE_TYPE_STR || type == BUNDLE_TYPE_BYTE;
 	bool array = type == BUNDLE_TYPE_STR_ARRAY || type == (uint32_t)BUNDLE_TYPE_BYTE_ARRAY;
 	if (!(scalar && count == 1) && !array)
@@ -393,8 +403,14 @@ bundle *bundle_decode(const bundle_raw *r, const int len)
 	uint32_t magic = 0, count = 0;
 	bundle *b = bundle_create();
 	bool ok = b && bundle_reader_u32(&rd, &magic) && magic == BUNDLE_CODEC_MAGIC && bundle_reader_u32(&rd, &count);
+	if (ok && count > DECODE_MAX_KEYS) {
+		LOGE("bundle of %u keys refused (at most %d)", count, DECODE_MAX_KEYS);
+		ok = false;
+	}
 	for (uint32_t i = 0; ok && i < count; i++)
 		ok = decode_record(&rd, b);
+	if (ok && rd.pos != rd.size)
+		ok = false; /* bytes behind the last record: not one of our bundles */
 	free(data);
 	if (!ok) {
 		LOGE("malformed bundle text (%d bytes)", len);

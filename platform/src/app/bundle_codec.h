@@ -6,6 +6,10 @@
 #include <stddef.h>
 #include <stdint.h>
 
+#ifdef __cplusplus
+extern "C" {
+#endif
+
 #define BUNDLE_CODEC_MAGIC 0x42444c31u /* "BDL1" */
 
 typedef struct {
@@ -35,5 +39,9 @@ bool bundle_reader_blob(bundle_reader_s *r, const void **bytes, size_t *len);
 char *bundle_base64_encode(const unsigned char *data, size_t size);
 /* Decoded bytes (malloc'ed) or NULL on a character outside the alphabet or a bad length. */
 unsigned char *bundle_base64_decode(const char *text, size_t len, size_t *out_size);
+
+#ifdef __cplusplus
+}
+#endif
 
 #endif /* PLATFORM_SRC_APP_BUNDLE_CODEC_H */

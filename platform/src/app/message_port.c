@@ -103,7 +103,7 @@ static void __port_read(local_port_s *port)
 {
 	int fd;
 	while ((fd = accept4(port->listen_fd, NULL, NULL, SOCK_NONBLOCK | SOCK_CLOEXEC)) >= 0) {
-		client_s *c = calloc(1, sizeof(*c));
+		client_s *c = app_channel_peer_allowed(fd) ? calloc(1, sizeof(*c)) : NULL;
 		if (!c) {
 			close(fd);
 			continue;

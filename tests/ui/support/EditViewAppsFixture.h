@@ -24,6 +24,9 @@ struct MemoEditViewTestAccess {
 	static bool isProcessing(MemoEditView *view) { return view->__processingPopup != nullptr; }
 	static void createAttachPanel(MemoEditView *view) { view->__createAttachPanel(); }
 	static bool isAttachPanelOpened(MemoEditView *view) { return view->__isAttachPanelOpened(); }
+	static MemoRecorder *recorder(MemoEditView *view) { return view->__recorder; }
+	static MemoPlayer *player(MemoEditView *view) { return view->__player; }
+	static const char *uuid(MemoEditView *view) { return view->__UUID; }
 };
 
 namespace memo_ui_test
