@@ -21,24 +21,24 @@ void MemoGridControl::__noteItemsBuilt()
 bool MemoGridControl::__rebindItems(Eina_List *items)
 {
 	// Equal rows give equal records, layout codes and texts; the view kind and the orientation choose the
-	// item class; a rebuilt grid starts at the top.
+	// item class; a rebuilt grid starts at the top. The cards are taken from the gengrid itself: a search
+	// may have deleted some since.
+	Evas_Object *gengrid = getEvasObj();
 	Evas_Coord x = 0, y = 0;
-	elm_scroller_region_get(getEvasObj(), &x, &y, nullptr, nullptr);
-	if (__itemCount <= 0 || !__itemsFrom || __itemList->getItem(0)->getTexts() != __itemsFrom ||
+	elm_scroller_region_get(gengrid, &x, &y, nullptr, nullptr);
+	if (__itemCount <= 0 || !__itemsFrom || __searchShown || __itemList->getItem(0)->getTexts() != __itemsFrom ||
 	    __itemsKind != (__gridMode ? *__gridMode : -1) || __itemsPortrait != gIsPortrait || x || y ||
-	    static_cast<int>(eina_list_count(items)) != __itemCount)
+	    static_cast<int>(elm_gengrid_items_count(gengrid)) != __itemCount)
 		return false;
+	eina_list_free(items);
 	int row = 0;
-	Eina_List *cell = nullptr;
-	void *data = nullptr;
-	EINA_LIST_FOREACH(items, cell, data)
-	{
+	for (Elm_Object_Item *it = elm_gengrid_first_item_get(gengrid); it; it = elm_gengrid_item_next_get(it), ++row) {
+		MemoGridItem *card = static_cast<MemoGridItem *>(elm_object_item_data_get(it));
 		MemoDocInfo *record = __itemList->getItem(row);
 		__prepareRecord(record);
-		static_cast<MemoGridItem *>(data)->rebind(record, row, __checkStates);
-		++row;
+		card->rebind(record, row, __checkStates);
+		__gridItems = eina_list_append(__gridItems, card);
 	}
-	__gridItems = items;
-	elm_gengrid_realized_items_update(getEvasObj());
+	elm_gengrid_realized_items_update(gengrid);
 	return true;
 }
