@@ -29,7 +29,9 @@ MemoText::MemoText(const char *text, size_t length) : __bits(0)
 
 void MemoText::__make(const char *text, size_t length)
 {
-	void *memory = ::operator new(offsetof(Block, text) + length + 1);
+	// The block is built whole, so a short text still takes at least the block's own size.
+	const size_t bytes = offsetof(Block, text) + length + 1;
+	void *memory = ::operator new(bytes > sizeof(Block) ? bytes : sizeof(Block));
 	Block *block = new (memory) Block{{1}, static_cast<uint32_t>(length), {}};
 	memcpy(block->text, text, length);
 	block->text[length] = '\0';

@@ -203,6 +203,9 @@ MemoMprisPlayer::~MemoMprisPlayer()
 {
 	if (!__conn)
 		return;
+	// Unregistering reads the properties once more; the handles may be gone by then.
+	__recorder = nullptr;
+	__player = nullptr;
 	eldbus_name_release(__conn, BUS_NAME, nullptr, nullptr);
 	if (__playerIface)
 		eldbus_service_interface_unregister(__playerIface);
