@@ -184,6 +184,7 @@ void MemoEditView::__changeToUpdateMode()
 	if (__mode != MODE_VIEW)
 		return;
 	__mode = MODE_UPDATE;
+	MEMO_LOGD("read view turned into an edit");
 	elm_object_signal_emit(getEvasObj(), "change,edit", "elm");
 	__createContentsLayout(getEvasObj());
 	__createTitleBar();
