@@ -131,6 +131,27 @@ protected:
 		return live;
 	}
 
+	// Opens a stored memo whose recording of the given length is in its media folder.
+	void openStoredVoiceMemo(const char *memo, const char *vr, int ms)
+	{
+		const std::string file = mediaDir(memo) + vr + ".amr";
+		ecore_file_mkpath(mediaDir(memo).c_str());
+		ASSERT_TRUE(MediaFiles::record(file, ms));
+		MemoDocInfo stored;
+		stored.setMemoUUID(memo);
+		stored.setTitle("Song");
+		stored.setTizenXmlContent(todoList(todoItem(0, false, "hum")).c_str());
+		stored.setVrfileUUID(vr);
+		ASSERT_TRUE(MemoDbMgr::getInstance()->addMemo(&stored));
+		MemoFileInfo row;
+		row.setFileUUID(vr);
+		row.setMemoUUID(memo);
+		row.setPath(file.c_str());
+		ASSERT_TRUE(MemoDbMgr::getInstance()->addNewFile(&row));
+		records.emplace_back(MemoDbMgr::getInstance()->getOneMemoN(memo));
+		view = openRecord(records.back().get());
+	}
+
 	MemoEditView *view = nullptr;
 };
 } // namespace
@@ -268,23 +289,7 @@ TEST_F(EditViewVoice, EndingTheAppSavesTheTake)
 TEST_F(EditViewVoice, PlayerPlaysPausesSeeksAndDeletesAtDone)
 {
 	// A stored memo with a recording of two seconds.
-	const char *memo = "voice-memo", *vr = "voice-file";
-	const std::string file = mediaDir(memo) + vr + ".amr";
-	ecore_file_mkpath(mediaDir(memo).c_str());
-	ASSERT_TRUE(MediaFiles::record(file, 2000));
-	MemoDocInfo stored;
-	stored.setMemoUUID(memo);
-	stored.setTitle("Song");
-	stored.setTizenXmlContent(todoList(todoItem(0, false, "hum")).c_str());
-	stored.setVrfileUUID(vr);
-	ASSERT_TRUE(MemoDbMgr::getInstance()->addMemo(&stored));
-	MemoFileInfo row;
-	row.setFileUUID(vr);
-	row.setMemoUUID(memo);
-	row.setPath(file.c_str());
-	ASSERT_TRUE(MemoDbMgr::getInstance()->addNewFile(&row));
-	records.emplace_back(MemoDbMgr::getInstance()->getOneMemoN(memo));
-	view = openRecord(records.back().get());
+	openStoredVoiceMemo("voice-memo", "voice-file", 2000);
 	ASSERT_NE(player(), nullptr);
 	EXPECT_FALSE(evas_object_visible_get(
 	    edje_object_part_object_get(elm_layout_edje_get(player()->getEvasObj()), "player_cancel_btn")));
@@ -329,7 +334,7 @@ TEST_F(EditViewVoice, PlayerPlaysPausesSeeksAndDeletesAtDone)
 	ASSERT_TRUE(waitFor([this] { return lastPagePopped; }));
 	EXPECT_EQ("", query("SELECT vrfileUUID FROM memo WHERE UUID = 'voice-memo'"));
 	EXPECT_EQ("", query("SELECT UUID FROM file WHERE memoUUID = 'voice-memo'"));
-	EXPECT_FALSE(ecore_file_exists(file.c_str()));
+	EXPECT_FALSE(ecore_file_exists((mediaDir("voice-memo") + "voice-file.amr").c_str()));
 }
 
 TEST_F(EditViewVoice, IndicatorHearsATakeInTheBackground)
@@ -402,23 +407,7 @@ TEST_F(EditViewVoice, MiniControllersRunTheTakeWhileTheAppIsInTheBackground)
 
 TEST_F(EditViewVoice, PlaybackInTheBackgroundIsPausedAndEndedFromOutside)
 {
-	const char *memo = "voice-memo-2", *vr = "voice-file-2";
-	const std::string file = mediaDir(memo) + vr + ".amr";
-	ecore_file_mkpath(mediaDir(memo).c_str());
-	ASSERT_TRUE(MediaFiles::record(file, 3000));
-	MemoDocInfo stored;
-	stored.setMemoUUID(memo);
-	stored.setTitle("Song");
-	stored.setTizenXmlContent(todoList(todoItem(0, false, "hum")).c_str());
-	stored.setVrfileUUID(vr);
-	ASSERT_TRUE(MemoDbMgr::getInstance()->addMemo(&stored));
-	MemoFileInfo row;
-	row.setFileUUID(vr);
-	row.setMemoUUID(memo);
-	row.setPath(file.c_str());
-	ASSERT_TRUE(MemoDbMgr::getInstance()->addNewFile(&row));
-	records.emplace_back(MemoDbMgr::getInstance()->getOneMemoN(memo));
-	view = openRecord(records.back().get());
+	openStoredVoiceMemo("voice-memo-2", "voice-file-2", 3000);
 	ASSERT_NE(player(), nullptr);
 	tapPart(player(), "player_pause_resume_btn");
 	ASSERT_TRUE(waitFor([this] { return MemoPlayerTestAccess::state(player()) == PLAYER_STATE_PLAYING; }));
