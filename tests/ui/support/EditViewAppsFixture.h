@@ -87,54 +87,11 @@ protected:
 		return waitFor([&] { return memo_test::countOf(calleeLog(id), text) >= times; }, 10.0);
 	}
 
-	// Opens the more menu by its key and gives the texts of its rows; empty when no menu opened.
-	std::vector<std::string> openMenu()
-	{
-		pressKey("F2");
-		settle(0.3);
-		std::vector<std::string> texts;
-		for (Elm_Object_Item *item : menuItems())
-			texts.push_back(elm_object_item_text_get(item));
-		return texts;
-	}
-	// Taps the row of the open menu that reads `text`.
-	void chooseMenu(const std::string &text)
-	{
-		for (Elm_Object_Item *item : menuItems()) {
-			if (text == elm_object_item_text_get(item)) {
-				tapItem(item);
-				settle(0.3);
-				return;
-			}
-		}
-		FAIL() << "no menu row " << text;
-	}
-	// Taps a widget item where it shows (the item may go with the tap).
-	void tapItem(Elm_Object_Item *item)
-	{
-		int x = 0, y = 0;
-		centreOf(elm_object_item_track(item), &x, &y);
-		elm_object_item_untrack(item);
-		tap(x, y);
-	}
+	std::vector<std::string> openMenu() { return openMenuOf(naviframe); }
+	void chooseMenu(const std::string &text) { chooseMenuOf(naviframe, text); }
 
 	std::string appsDir, logDir;
 	std::set<std::string> registered;
-
-private:
-	std::vector<Elm_Object_Item *> menuItems()
-	{
-		app_assist::WViewController *top = naviframe->getTopContentViewController();
-		app_assist::WViewController *menu = top ? top->getPopup() : nullptr;
-		std::vector<Elm_Object_Item *> items;
-		if (!dynamic_cast<app_assist::WMenuPopupController *>(menu))
-			return items;
-		const Eina_List *l = nullptr;
-		void *data = nullptr;
-		EINA_LIST_FOREACH(elm_list_items_get(elm_object_content_get(menu->getEvasObj())), l, data)
-		items.push_back(static_cast<Elm_Object_Item *>(data));
-		return items;
-	}
 };
 
 // The build's registry holds real apps too (the companions, the memo app itself): when a chooser comes

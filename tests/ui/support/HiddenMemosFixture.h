@@ -130,34 +130,8 @@ protected:
 		MemoDbMgr::getInstance()->setHiddenMemoPassword(digest);
 	}
 
-	// The more menu of the page on top, by its key: the texts of its rows.
-	std::vector<std::string> openMenu()
-	{
-		pressKey("F2");
-		runFor(0.3);
-		std::vector<std::string> texts;
-		for (Elm_Object_Item *item : __menuItems())
-			texts.push_back(elm_object_item_text_get(item));
-		return texts;
-	}
-	void chooseMenu(const std::string &text)
-	{
-		for (Elm_Object_Item *item : __menuItems()) {
-			if (text == elm_object_item_text_get(item)) {
-				tapItem(item);
-				runFor(0.3);
-				return;
-			}
-		}
-		FAIL() << "no menu row " << text;
-	}
-	void tapItem(Elm_Object_Item *item)
-	{
-		int x = 0, y = 0;
-		centreOf(elm_object_item_track(item), &x, &y);
-		elm_object_item_untrack(item);
-		tap(x, y);
-	}
+	std::vector<std::string> openMenu() { return openMenuOf(naviframe()); }
+	void chooseMenu(const std::string &text) { chooseMenuOf(naviframe(), text); }
 
 	// The app ends as the platform ends it and starts again on the same store and preferences.
 	void restartApp()
@@ -170,20 +144,6 @@ protected:
 	}
 
 private:
-	std::vector<Elm_Object_Item *> __menuItems()
-	{
-		app_assist::WViewController *topView = naviframe()->getTopContentViewController();
-		app_assist::WViewController *menu = topView ? topView->getPopup() : nullptr;
-		std::vector<Elm_Object_Item *> items;
-		if (!dynamic_cast<app_assist::WMenuPopupController *>(menu))
-			return items;
-		const Eina_List *l = nullptr;
-		void *data = nullptr;
-		EINA_LIST_FOREACH(elm_list_items_get(elm_object_content_get(menu->getEvasObj())), l, data)
-		items.push_back(static_cast<Elm_Object_Item *>(data));
-		return items;
-	}
-
 	unsigned int __keyTime = 1000;
 };
 

@@ -6,6 +6,10 @@
 #include <cmath>
 #include <cstdint>
 
+#include <WContentViewController.h>
+#include <WMenuPopupController.h>
+#include <WNaviframeController.h>
+
 #include "TestEnv.h"
 #include "Util/MemoUtil.h"
 
@@ -178,6 +182,52 @@ void UiFixture::centreOf(Evas_Object *obj, int *x, int *y)
 	evas_object_geometry_get(obj, &ox, &oy, &ow, &oh);
 	*x = ox + ow / 2;
 	*y = oy + oh / 2;
+}
+
+static std::vector<Elm_Object_Item *> menuItemsOf(app_assist::WNaviframeController *nav)
+{
+	app_assist::WViewController *top = nav ? nav->getTopContentViewController() : nullptr;
+	app_assist::WViewController *menu = top ? top->getPopup() : nullptr;
+	std::vector<Elm_Object_Item *> items;
+	if (!dynamic_cast<app_assist::WMenuPopupController *>(menu))
+		return items;
+	const Eina_List *l = nullptr;
+	void *data = nullptr;
+	EINA_LIST_FOREACH(elm_list_items_get(elm_object_content_get(menu->getEvasObj())), l, data)
+	items.push_back(static_cast<Elm_Object_Item *>(data));
+	return items;
+}
+
+std::vector<std::string> UiFixture::openMenuOf(app_assist::WNaviframeController *nav)
+{
+	pressKey("F2");
+	runFor(0.3);
+	render();
+	std::vector<std::string> texts;
+	for (Elm_Object_Item *item : menuItemsOf(nav))
+		texts.push_back(elm_object_item_text_get(item));
+	return texts;
+}
+
+void UiFixture::chooseMenuOf(app_assist::WNaviframeController *nav, const std::string &text)
+{
+	for (Elm_Object_Item *item : menuItemsOf(nav)) {
+		if (text == elm_object_item_text_get(item)) {
+			tapItem(item);
+			runFor(0.3);
+			render();
+			return;
+		}
+	}
+	FAIL() << "no menu row " << text;
+}
+
+void UiFixture::tapItem(Elm_Object_Item *item)
+{
+	int x = 0, y = 0;
+	centreOf(elm_object_item_track(item), &x, &y);
+	elm_object_item_untrack(item);
+	tap(x, y);
 }
 
 void UiFixture::focus(Evas_Object *widget)

@@ -7,11 +7,17 @@
 #include <cstdint>
 #include <functional>
 #include <string>
+#include <vector>
 
 #include <Elementary.h>
 // The toasts posted: desktop_toast_log_count(), _get(index) and _clear().
 #include <desktop/toast_log.h>
 #include <gtest/gtest.h>
+
+namespace app_assist
+{
+class WNaviframeController;
+}
 
 namespace memo_ui_test
 {
@@ -54,6 +60,13 @@ protected:
 
 	// Focuses the widget and gives the canvas the keyboard.
 	void focus(Evas_Object *widget);
+
+	// The more menu of the page on top of `nav`: opened by its key (the texts of its rows; empty when no
+	// menu opened), and a tap on the row that reads `text`.
+	std::vector<std::string> openMenuOf(app_assist::WNaviframeController *nav);
+	void chooseMenuOf(app_assist::WNaviframeController *nav, const std::string &text);
+	// Taps a widget item where it shows (the item may go with the tap).
+	void tapItem(Elm_Object_Item *item);
 
 	Evas_Object *win = nullptr;
 	Evas_Object *scroller = nullptr;
