@@ -46,12 +46,7 @@ Evas_Object *MemoPlayer::onCreateView(Evas_Object *parent, void *param)
 	}
 	player_set_interrupted_cb(__player, __playerInterruptedCb, this);
 	__parent = parent;
-	elm_object_signal_emit(parent, "recorder,start", "elm");
-	Evas_Object *layout = elm_layout_add(parent);
-	elm_object_part_content_set(parent, "recorder_contents", layout);
-	if (!elm_layout_file_set(layout, MemoUtil::getEdjePath(), PLAYER_GROUP))
-		MEMO_LOGE("group %s not found", PLAYER_GROUP);
-	evas_object_show(layout);
+	Evas_Object *layout = memoVoiceAddPanelLayout(parent, PLAYER_GROUP);
 	Evas_Object *edje = elm_layout_edje_get(layout);
 
 	if (!param) {
@@ -167,9 +162,7 @@ bool MemoPlayer::__isInCall()
 {
 	if (!__callManager && cm_init(&__callManager) != CM_ERROR_NONE)
 		__callManager = nullptr;
-	cm_call_status_e status = CM_CALL_STATUS_IDLE;
-	return __callManager && cm_get_call_status(__callManager, &status) == CM_ERROR_NONE &&
-	       status != CM_CALL_STATUS_IDLE;
+	return memoVoiceInCall(__callManager);
 }
 
 void MemoPlayer::__setText(const char *part, int ms)
