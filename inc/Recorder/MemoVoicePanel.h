@@ -34,6 +34,8 @@ app_assist::WPopupController *memoVoiceConfirmPopupN(const char *title, const ch
 
 // True while the call manager reports a call.
 bool memoVoiceInCall(cm_client_h callManager);
+// Lets go of the call manager when `*callManager` is set, and clears it.
+void memoVoiceEndCalls(cm_client_h *callManager);
 
 // Stops listening to the app's broadcasts when `*id` is set, and clears it.
 void memoVoiceRemoveBroadcastListener(unsigned int *id);

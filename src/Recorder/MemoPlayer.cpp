@@ -135,10 +135,7 @@ void MemoPlayer::onDestroy()
 		__resetJob = nullptr;
 	}
 	memoVoiceMediaKeyReleaseAsync();
-	if (__callManager) {
-		cm_deinit(__callManager);
-		__callManager = nullptr;
-	}
+	memoVoiceEndCalls(&__callManager);
 	if (__notiMini)
 		__sendMessagePort();
 }

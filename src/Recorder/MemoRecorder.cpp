@@ -101,23 +101,11 @@ void MemoRecorder::onCreated()
 
 void MemoRecorder::onDestroy()
 {
-	if (__recorder) {
-		// A take still running is given up: the file goes with it.
-		if (__isActive())
-			recorder_cancel(__recorder);
-		if (__getState() == RECORDER_STATE_READY)
-			recorder_unprepare(__recorder);
-		if (__getState() == RECORDER_STATE_CREATED) {
-			recorder_destroy(__recorder);
-			__recorder = nullptr;
-		}
-	}
+	// A take still running is given up: the file goes with it.
+	__discardTake();
 	__destroySession("onDestroy");
 	__stopMpris();
-	if (__callManager) {
-		cm_deinit(__callManager);
-		__callManager = nullptr;
-	}
+	memoVoiceEndCalls(&__callManager);
 	memoVoiceMediaKeyReleaseAsync();
 	if (__notiMini)
 		__sendMessagePort();

@@ -88,6 +88,13 @@ bool memoVoiceInCall(cm_client_h callManager)
 	return callManager && cm_get_call_status(callManager, &status) == CM_ERROR_NONE && status != CM_CALL_STATUS_IDLE;
 }
 
+void memoVoiceEndCalls(cm_client_h *callManager)
+{
+	if (*callManager)
+		cm_deinit(*callManager);
+	*callManager = nullptr;
+}
+
 void memoVoiceRemoveBroadcastListener(unsigned int *id)
 {
 	if (*id)
