@@ -17,6 +17,7 @@
 #include "Model/MemoPopupMonitor.h"
 #include "Util/MemoUtil.h"
 #include "View/MemoStorageFull.h"
+#include "MemoViewParts.h"
 
 using app_assist::WMenuPopupController;
 using app_assist::WPopupController;
@@ -45,16 +46,7 @@ void MemoListView::__showFloatingButton()
 			return;
 		eext_floatingbutton_mode_set(__floatingBtn, EEXT_FLOATINGBUTTON_MODE_BOTH_SIDES);
 		elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
-		Evas_Object *button = elm_button_add(__floatingBtn);
-		elm_object_style_set(button, "memo_floating");
-		elm_object_part_content_set(__floatingBtn, "button1", button);
-		Evas_Object *icon = elm_image_add(button);
-		char *path = MemoUtil::getImageResourcePathN("core_floating_button_icon.png");
-		if (path)
-			elm_image_file_set(icon, path, nullptr);
-		free(path);
-		elm_object_part_content_set(button, "icon", icon);
-		evas_object_smart_callback_add(button, "clicked", __newMemoBtnCb, this);
+		memoViewNewMemoButtonAdd(__floatingBtn, __newMemoBtnCb, this);
 	} else {
 		elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
 	}

@@ -1,0 +1,17 @@
+// Pieces that several pages build alike: the page's layout, the empty state, the new-memo button.
+#ifndef SRC_VIEW_MEMOVIEWPARTS_H
+#define SRC_VIEW_MEMOVIEWPARTS_H
+
+#include <Elementary.h>
+
+// Puts in *layout a layout of the theme's group that expands to fill the page; false when the theme has no
+// such group (the layout is made all the same, and the caller says whether that is worth a log line).
+bool memoViewPageLayoutAdd(Evas_Object *parent, const char *group, Evas_Object **layout);
+
+// The "nothing here" layout, centred, with the text `textId` of `domain` and the help on creating memos.
+Evas_Object *memoViewNoContentLayoutAdd(Evas_Object *parent, const char *domain, const char *textId);
+
+// The round new-memo button inside the floating button, calling `cb` with `data` when clicked.
+Evas_Object *memoViewNewMemoButtonAdd(Evas_Object *floatingBtn, Evas_Smart_Cb cb, void *data);
+
+#endif
