@@ -8,7 +8,6 @@
 #include <WNaviframeController.h>
 
 #include "MemoLog.h"
-#include "Util/MemoUtil.h"
 #include "View/MemoHiddenPasswordView.h"
 #include "View/MemoHiddenTitle.h"
 #include "View/MemoListView.h"

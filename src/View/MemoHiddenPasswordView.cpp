@@ -9,7 +9,6 @@
 
 #include "DataBase/MemoDbMgr.h"
 #include "MemoLog.h"
-#include "Util/MemoUtil.h"
 #include "View/MemoHiddenPinLock.h"
 #include "View/MemoHiddenTitle.h"
 #include "MemoViewParts.h"

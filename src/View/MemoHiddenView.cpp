@@ -1,7 +1,6 @@
 // The hidden memos' page: the grid or the empty state, the editor on a tap, the floating button, the way back.
 #include "View/MemoHiddenView.h"
 
-#include <cstdlib>
 #include <cstring>
 
 #include <eext_floatingbutton.h>
@@ -15,7 +14,6 @@
 #include "List/MemoGridControl.h"
 #include "List/MemoGridItem.h"
 #include "MemoLog.h"
-#include "Util/MemoUtil.h"
 #include "View/MemoEditView.h"
 #include "View/MemoHiddenTitle.h"
 #include "MemoViewParts.h"

@@ -15,7 +15,6 @@
 #include "MemoApp.h"
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
-#include "Util/MemoUtil.h"
 #include "MemoViewParts.h"
 
 using app_assist::WUiTimer;

@@ -1,7 +1,6 @@
 // The list's ways on: the floating button for a new memo (or the storage-full popup), and the more menu.
 #include "View/MemoListView.h"
 
-#include <cstdlib>
 
 #include <app_i18n.h>
 #include <eext_floatingbutton.h>

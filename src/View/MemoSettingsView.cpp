@@ -10,7 +10,6 @@
 
 #include "DataBase/MemoDbMgr.h"
 #include "MemoLog.h"
-#include "Util/MemoUtil.h"
 #include "View/MemoHiddenFirstAccess.h"
 #include "View/MemoHiddenPasswordView.h"
 #include "View/MemoHiddenTitle.h"
