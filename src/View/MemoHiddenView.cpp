@@ -3,7 +3,6 @@
 
 #include <cstring>
 
-#include <eext_floatingbutton.h>
 #include <efl_extension.h>
 
 #include <WNaviframeController.h>
@@ -153,11 +152,9 @@ void MemoHiddenView::__showFloatingButton()
 		return;
 	}
 	if (!__floatingBtn) {
-		__floatingBtn = eext_floatingbutton_add(baseLayout);
+		__floatingBtn = memoViewNewMemoFloatingButtonAdd(baseLayout, __newMemoBtnCb, this);
 		if (!__floatingBtn)
 			return;
-		eext_floatingbutton_mode_set(__floatingBtn, EEXT_FLOATINGBUTTON_MODE_BOTH_SIDES);
-		memoViewNewMemoButtonAdd(__floatingBtn, __newMemoBtnCb, this);
 		// Whoever fills the part next deletes what is left in it.
 		evas_object_event_callback_add(
 		    __floatingBtn, EVAS_CALLBACK_DEL,

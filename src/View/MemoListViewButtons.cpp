@@ -1,9 +1,7 @@
 // The list's ways on: the floating button for a new memo (or the storage-full popup), and the more menu.
 #include "View/MemoListView.h"
 
-
 #include <app_i18n.h>
-#include <eext_floatingbutton.h>
 #include <notification_status.h>
 
 #include <WMenuPopupController.h>
@@ -40,15 +38,11 @@ void MemoListView::__showFloatingButton()
 		return;
 	}
 	if (!__floatingBtn) {
-		__floatingBtn = eext_floatingbutton_add(baseLayout);
+		__floatingBtn = memoViewNewMemoFloatingButtonAdd(baseLayout, __newMemoBtnCb, this);
 		if (!__floatingBtn)
 			return;
-		eext_floatingbutton_mode_set(__floatingBtn, EEXT_FLOATINGBUTTON_MODE_BOTH_SIDES);
-		elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
-		memoViewNewMemoButtonAdd(__floatingBtn, __newMemoBtnCb, this);
-	} else {
-		elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
 	}
+	elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
 	evas_object_show(__floatingBtn);
 }
 

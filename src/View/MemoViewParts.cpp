@@ -2,6 +2,8 @@
 
 #include <cstdlib>
 
+#include <eext_floatingbutton.h>
+
 #include "Util/MemoUtil.h"
 
 bool memoViewPageLayoutAdd(Evas_Object *parent, const char *group, Evas_Object **layout)
@@ -26,8 +28,12 @@ Evas_Object *memoViewNoContentLayoutAdd(Evas_Object *parent, const char *domain,
 	return layout;
 }
 
-Evas_Object *memoViewNewMemoButtonAdd(Evas_Object *floatingBtn, Evas_Smart_Cb cb, void *data)
+Evas_Object *memoViewNewMemoFloatingButtonAdd(Evas_Object *baseLayout, Evas_Smart_Cb cb, void *data)
 {
+	Evas_Object *floatingBtn = eext_floatingbutton_add(baseLayout);
+	if (!floatingBtn)
+		return nullptr;
+	eext_floatingbutton_mode_set(floatingBtn, EEXT_FLOATINGBUTTON_MODE_BOTH_SIDES);
 	Evas_Object *button = elm_button_add(floatingBtn);
 	elm_object_style_set(button, "memo_floating");
 	elm_object_part_content_set(floatingBtn, "button1", button);
@@ -38,5 +44,5 @@ Evas_Object *memoViewNewMemoButtonAdd(Evas_Object *floatingBtn, Evas_Smart_Cb cb
 	free(path);
 	elm_object_part_content_set(button, "icon", icon);
 	evas_object_smart_callback_add(button, "clicked", cb, data);
-	return button;
+	return floatingBtn;
 }

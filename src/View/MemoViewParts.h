@@ -11,7 +11,8 @@ bool memoViewPageLayoutAdd(Evas_Object *parent, const char *group, Evas_Object *
 // The "nothing here" layout, centred, with the text `textId` of `domain` and the help on creating memos.
 Evas_Object *memoViewNoContentLayoutAdd(Evas_Object *parent, const char *domain, const char *textId);
 
-// The round new-memo button inside the floating button, calling `cb` with `data` when clicked.
-Evas_Object *memoViewNewMemoButtonAdd(Evas_Object *floatingBtn, Evas_Smart_Cb cb, void *data);
+// The floating button on both sides of the base layout, holding the round new-memo button that calls `cb`
+// with `data` when clicked; null when the floating button could not be made. The caller puts it in its part.
+Evas_Object *memoViewNewMemoFloatingButtonAdd(Evas_Object *baseLayout, Evas_Smart_Cb cb, void *data);
 
 #endif
