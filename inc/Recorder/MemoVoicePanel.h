@@ -37,6 +37,8 @@ bool memoVoiceInCall(cm_client_h callManager);
 // Lets go of the call manager when `*callManager` is set, and clears it.
 void memoVoiceEndCalls(cm_client_h *callManager);
 
+// Listens to the app's broadcasts for as long as `owner` lives, unless `*id` says it does already.
+void memoVoiceAddBroadcastListener(unsigned int *id, std::function<void(const char *)> onKey, Evas_Object *owner);
 // Stops listening to the app's broadcasts when `*id` is set, and clears it.
 void memoVoiceRemoveBroadcastListener(unsigned int *id);
 

@@ -11,7 +11,6 @@
 
 #include "MemoApp.h"
 #include "MemoLog.h"
-#include "Model/MemoBroadCaster.h"
 #include "Recorder/MemoVoicePanel.h"
 #include "Util/MemoUtil.h"
 
@@ -111,9 +110,8 @@ player_h MemoPlayer::__playerHandleCreate(const char *path)
 void MemoPlayer::onCreated()
 {
 	__updatePlayerLayout();
-	if (__broadcastId == 0)
-		__broadcastId = MemoBroadCaster::getInstance().addListener(
-		    [this](const char *key, void *) { __playerBroadCasterCb(key); }, getEvasObj());
+	memoVoiceAddBroadcastListener(
+	    &__broadcastId, [this](const char *key) { __playerBroadCasterCb(key); }, getEvasObj());
 }
 
 void MemoPlayer::onDestroy()

@@ -12,7 +12,6 @@
 
 #include "MemoApp.h"
 #include "MemoLog.h"
-#include "Model/MemoBroadCaster.h"
 #include "Recorder/MemoMprisPlayer.h"
 #include "Recorder/MemoVoicePanel.h"
 #include "Util/MemoUtil.h"
@@ -94,9 +93,8 @@ Evas_Object *MemoRecorder::__takePartObject(const char *part, Evas_Object_Event_
 void MemoRecorder::onCreated()
 {
 	__updateRecorderLayout();
-	if (__broadcastId == 0)
-		__broadcastId = MemoBroadCaster::getInstance().addListener(
-		    [this](const char *key, void *) { __recorderBroadCasterCb(key); }, getEvasObj());
+	memoVoiceAddBroadcastListener(
+	    &__broadcastId, [this](const char *key) { __recorderBroadCasterCb(key); }, getEvasObj());
 }
 
 void MemoRecorder::onDestroy()

@@ -95,6 +95,12 @@ void memoVoiceEndCalls(cm_client_h *callManager)
 	*callManager = nullptr;
 }
 
+void memoVoiceAddBroadcastListener(unsigned int *id, std::function<void(const char *)> onKey, Evas_Object *owner)
+{
+	if (*id == 0)
+		*id = MemoBroadCaster::getInstance().addListener([onKey](const char *key, void *) { onKey(key); }, owner);
+}
+
 void memoVoiceRemoveBroadcastListener(unsigned int *id)
 {
 	if (*id)
