@@ -70,6 +70,8 @@ private:
 	int __recorderStart(recorder_h recorder);
 	void __recorderPause();
 	void __recorderCancel();
+	// Cancels a running take, unprepares and destroys the handle.
+	void __discardTake();
 	void __destroySession(const char *caller);
 	void __createStorageFullPopup();
 	bool _isEarjackInserted();

@@ -1,11 +1,9 @@
 #include "Recorder/MRecorderLockScreenMiniController.h"
 
 #include <Elementary.h>
-#include <minicontrol-provider.h>
 
 #include "MemoLog.h"
 #include "MiniControllerSupport.h"
-#include "Util/MemoUtil.h"
 
 using namespace mini_controller;
 
@@ -13,9 +11,6 @@ namespace
 {
 const char *const WINDOW_NAME = "memo-minicontrol.LOCKSCREEN";
 const char *const GROUP = "mini_lockscreen_controller";
-
-// The lock screen sends nothing that this controller acts on.
-void windowEventCb(minicontrol_viewer_event_e, bundle *) {}
 } // namespace
 
 MRecorderLockScreenMiniController::MRecorderLockScreenMiniController(recorder_h recorder)
@@ -30,38 +25,20 @@ MRecorderLockScreenMiniController::~MRecorderLockScreenMiniController()
 
 void MRecorderLockScreenMiniController::create()
 {
-	_win = minicontrol_create_window(WINDOW_NAME, MINICONTROL_TARGET_VIEWER_STOCK_LOCK_SCREEN, windowEventCb);
-	elm_win_alpha_set(_win, EINA_TRUE);
-	evas_object_resize(_win, lockWidth(_win), scaled(LOCK_HEIGHT));
-	evas_object_show(_win);
-
-	_layout = elm_layout_add(_win);
-	elm_layout_file_set(_layout, MemoUtil::getEdjePath(), GROUP);
-	evas_object_size_hint_weight_set(_layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	evas_object_show(_layout);
-	elm_win_resize_object_add(_win, _layout);
-
+	_win = createLockWindow(WINDOW_NAME);
+	_layout = addLayout(_win, GROUP);
 	if (!_layout)
 		MEMO_LOGE("_layout is nullptr");
 	else
 		addPartMouseUp(_layout, "recorder_left_btn_bg", __stopBtnCb, this);
-	for (const char *part : {"recorder_resume_btn", "recorder_pause_btn"}) {
-		if (!_layout)
-			MEMO_LOGE("getEvasObj() is nullptr");
-		else
-			addPartMouseUp(_layout, part, __toggleBtnCb, this);
-	}
+	for (const char *part : {"recorder_resume_btn", "recorder_pause_btn"})
+		addButton(_layout, part, __toggleBtnCb, this);
 	update();
 }
 
 void MRecorderLockScreenMiniController::hide()
 {
-	if (_win) {
-		evas_object_hide(_win);
-		evas_object_del(_win);
-	}
-	_win = nullptr;
-	_layout = nullptr;
+	deleteWindow(&_win, &_layout);
 }
 
 void MRecorderLockScreenMiniController::update()

@@ -7,7 +7,6 @@
 
 #include "MemoLog.h"
 #include "MiniControllerSupport.h"
-#include "Util/MemoUtil.h"
 
 #include <Ecore_X.h>
 #include <Elementary.h>
@@ -46,18 +45,8 @@ MRecorderNotiMiniController::~MRecorderNotiMiniController()
 
 void MRecorderNotiMiniController::create()
 {
-	_win = minicontrol_create_window(WINDOW_NAME, MINICONTROL_TARGET_VIEWER_QUICK_PANEL, __windowEventCb);
-	_rotation = elm_win_rotation_get(_win);
-	elm_win_alpha_set(_win, EINA_TRUE);
-	evas_object_resize(_win, panelWidth(_rotation), scaled(NOTI_HEIGHT));
-	evas_object_show(_win);
-
-	_layout = elm_layout_add(_win);
-	elm_layout_file_set(_layout, MemoUtil::getEdjePath(), GROUP);
-	evas_object_size_hint_weight_set(_layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	evas_object_show(_layout);
-	elm_win_resize_object_add(_win, _layout);
-
+	_win = createNotiWindow(WINDOW_NAME, __windowEventCb, &_rotation);
+	_layout = addLayout(_win, GROUP);
 	__addCancelButton();
 	__addTitle();
 	__addStopButton();
@@ -69,22 +58,13 @@ void MRecorderNotiMiniController::create()
 
 void MRecorderNotiMiniController::hide()
 {
-	if (_win) {
-		evas_object_hide(_win);
-		evas_object_del(_win);
-	}
-	_win = nullptr;
-	_layout = nullptr;
-	if (_xEventHandler)
-		ecore_event_handler_del(_xEventHandler);
-	_xEventHandler = nullptr;
+	deleteWindow(&_win, &_layout);
+	deleteHandler(&_xEventHandler);
 }
 
 void MRecorderNotiMiniController::destroy()
 {
-	if (_xEventHandler)
-		ecore_event_handler_del(_xEventHandler);
-	_xEventHandler = nullptr;
+	deleteHandler(&_xEventHandler);
 	if (_win)
 		evas_object_del(_win);
 	_win = nullptr;
@@ -127,11 +107,7 @@ void MRecorderNotiMiniController::setTimeHour(const char *text)
 
 void MRecorderNotiMiniController::__addCancelButton()
 {
-	if (!_layout) {
-		MEMO_LOGE("getEvasObj() is nullptr");
-		return;
-	}
-	addPartMouseUp(_layout, "recorder_cancel_btn", __cancelBtnCb, this);
+	addButton(_layout, "recorder_cancel_btn", __cancelBtnCb, this);
 }
 
 void MRecorderNotiMiniController::__addTitle()
@@ -154,20 +130,12 @@ void MRecorderNotiMiniController::__addStopButton()
 
 void MRecorderNotiMiniController::__addResumeButton()
 {
-	if (!_layout) {
-		MEMO_LOGE("getEvasObj() is nullptr");
-		return;
-	}
-	addPartMouseUp(_layout, "recorder_resume_btn", __resumeBtnCb, this);
+	addButton(_layout, "recorder_resume_btn", __resumeBtnCb, this);
 }
 
 void MRecorderNotiMiniController::__addPauseButton()
 {
-	if (!_layout) {
-		MEMO_LOGE("getEvasObj() is nullptr");
-		return;
-	}
-	addPartMouseUp(_layout, "recorder_pause_btn", __pauseBtnCb, this);
+	addButton(_layout, "recorder_pause_btn", __pauseBtnCb, this);
 }
 
 void MRecorderNotiMiniController::__cancelBtnCb(void *data, Evas *, Evas_Object *, void *)
@@ -288,12 +256,7 @@ Eina_Bool MRecorderNotiMiniController::_clientMessageCb(void *data, int, void *e
 		MEMO_LOGE("self is nullptr");
 		return EINA_FALSE;
 	}
-	Ecore_X_Event_Client_Message *ev = static_cast<Ecore_X_Event_Client_Message *>(event);
-	if (ev->message_type == ECORE_X_ATOM_E_ILLUME_ROTATE_ROOT_ANGLE && ev->data.l[0] != self->_rotation) {
-		int angle = static_cast<int>(ev->data.l[0]);
-		evas_object_resize(self->_win, panelWidth(angle), scaled(NOTI_HEIGHT));
-		self->_rotation = angle;
+	if (rotateNotiWindow(self->_win, &self->_rotation, event))
 		self->update();
-	}
 	return EINA_TRUE;
 }

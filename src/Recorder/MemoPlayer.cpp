@@ -11,7 +11,6 @@
 
 #include "MemoApp.h"
 #include "MemoLog.h"
-#include "Model/MemoBroadCaster.h"
 #include "Recorder/MemoVoicePanel.h"
 #include "Util/MemoUtil.h"
 
@@ -46,12 +45,7 @@ Evas_Object *MemoPlayer::onCreateView(Evas_Object *parent, void *param)
 	}
 	player_set_interrupted_cb(__player, __playerInterruptedCb, this);
 	__parent = parent;
-	elm_object_signal_emit(parent, "recorder,start", "elm");
-	Evas_Object *layout = elm_layout_add(parent);
-	elm_object_part_content_set(parent, "recorder_contents", layout);
-	if (!elm_layout_file_set(layout, MemoUtil::getEdjePath(), PLAYER_GROUP))
-		MEMO_LOGE("group %s not found", PLAYER_GROUP);
-	evas_object_show(layout);
+	Evas_Object *layout = memoVoiceAddPanelLayout(parent, PLAYER_GROUP);
 	Evas_Object *edje = elm_layout_edje_get(layout);
 
 	if (!param) {
@@ -116,9 +110,8 @@ player_h MemoPlayer::__playerHandleCreate(const char *path)
 void MemoPlayer::onCreated()
 {
 	__updatePlayerLayout();
-	if (__broadcastId == 0)
-		__broadcastId = MemoBroadCaster::getInstance().addListener(
-		    [this](const char *key, void *) { __playerBroadCasterCb(key); }, getEvasObj());
+	memoVoiceAddBroadcastListener(
+	    &__broadcastId, [this](const char *key) { __playerBroadCasterCb(key); }, getEvasObj());
 }
 
 void MemoPlayer::onDestroy()
@@ -140,10 +133,7 @@ void MemoPlayer::onDestroy()
 		__resetJob = nullptr;
 	}
 	memoVoiceMediaKeyReleaseAsync();
-	if (__callManager) {
-		cm_deinit(__callManager);
-		__callManager = nullptr;
-	}
+	memoVoiceEndCalls(&__callManager);
 	if (__notiMini)
 		__sendMessagePort();
 }
@@ -167,9 +157,7 @@ bool MemoPlayer::__isInCall()
 {
 	if (!__callManager && cm_init(&__callManager) != CM_ERROR_NONE)
 		__callManager = nullptr;
-	cm_call_status_e status = CM_CALL_STATUS_IDLE;
-	return __callManager && cm_get_call_status(__callManager, &status) == CM_ERROR_NONE &&
-	       status != CM_CALL_STATUS_IDLE;
+	return memoVoiceInCall(__callManager);
 }
 
 void MemoPlayer::__setText(const char *part, int ms)

@@ -5,17 +5,12 @@
 #include <cstring>
 
 #include <WPopupController.h>
-#include <WUiTimer.h>
 
 #include "MemoLog.h"
-#include "Model/MemoBroadCaster.h"
-#include "Model/MemoPopupMonitor.h"
 #include "Recorder/MPlayerLockScreenMiniController.h"
 #include "Recorder/MemoVoicePanel.h"
 #include "Recorder/MplayerNotiMiniController.h"
 #include "Util/MemoUtil.h"
-
-using app_assist::WPopupController;
 
 void MemoPlayer::__PlayerDeletePopupCb(void *data, Evas *evas, Evas_Object *obj, void *eventInfo)
 {
@@ -25,28 +20,13 @@ void MemoPlayer::__PlayerDeletePopupCb(void *data, Evas *evas, Evas_Object *obj,
 	MemoPlayer *self = static_cast<MemoPlayer *>(data);
 	MemoUtil::playTapFeedback();
 	self->__signal.emit("player,deletePopUp", nullptr);
-	app_assist::WUiTimer::addTimer(
-	    0.1,
-	    [self](void *) {
-		    self->__showDeletePopup();
-		    return false;
-	    },
-	    nullptr, self->getEvasObj());
+	memoVoiceAfterTap(self->getEvasObj(), [self]() { self->__showDeletePopup(); });
 }
 
 void MemoPlayer::__showDeletePopup()
 {
-	WPopupController *popup = new WPopupController();
-	popup->setTextTranslatable("memo-sub");
-	popup->setTitle("IDS_MEMO_BUTTON_DELETE");
-	popup->setContent("IDS_MEMO_POP_THIS_VOICE_MEMO_WILL_BE_DELETED");
-	popup->addButton("IDS_MEMO_BUTTON_CANCEL", std::function<void(bool *)>());
-	popup->addButton("IDS_MEMO_BUTTON_DELETE", [this](bool *close) {
-		__playerDelete();
-		*close = true;
-	});
-	MemoPopupMonitor::getInstance()->addPopup(popup);
-	attachPopup(popup);
+	attachPopup(memoVoiceConfirmPopupN("IDS_MEMO_BUTTON_DELETE", "IDS_MEMO_POP_THIS_VOICE_MEMO_WILL_BE_DELETED",
+	                                   "IDS_MEMO_BUTTON_DELETE", [this]() { __playerDelete(); }));
 }
 
 // The owner forgets the file; the file itself goes at the next save.
@@ -69,9 +49,6 @@ void MemoPlayer::__playerDelete()
 	memoVoiceMediaKeyReleaseAsync();
 	__signal.emit("player,delete", nullptr);
 }
-
-// From one hour on the notification controller shows the time in its hour part.
-static const int HOUR_MS = 3600000;
 
 void MemoPlayer::__playerBroadCasterCb(const char *key)
 {
@@ -96,9 +73,7 @@ void MemoPlayer::__playerBroadCasterCb(const char *key)
 
 void MemoPlayer::__removeBroadcastListener()
 {
-	if (__broadcastId)
-		MemoBroadCaster::getInstance().removeListener(__broadcastId);
-	__broadcastId = 0;
+	memoVoiceRemoveBroadcastListener(&__broadcastId);
 }
 
 // The indicator shows playback running or paused while the app is in the background; the recorder uses
@@ -127,10 +102,7 @@ void MemoPlayer::__media_key_event_cb(media_key_e key, media_key_event_e status,
 		MEMO_LOGE("Memo Player Handler is NULL");
 		return;
 	}
-	if (key != MEDIA_KEY_MEDIA)
-		return;
-	self->__mediaKeyPressed = !self->__mediaKeyPressed;
-	if (!self->__mediaKeyPressed && self->__isActive())
+	if (memoVoiceMediaKeyToggled(key, &self->__mediaKeyPressed) && self->__isActive())
 		__pauseResumeCb(self, nullptr, nullptr, nullptr);
 }
 
@@ -155,50 +127,31 @@ void MemoPlayer::__playerInterruptedCb(player_interrupted_code_e code, void *dat
 
 void MemoPlayer::__createMiniControllers()
 {
-	__notiMini = new MplayerNotiMiniController(__player);
-	__notiMini->create();
-	__notiMini->_signal.addListener([this](const char *event, const char *) { __onNotiMiniEvent(event); });
-	__lockMini = new MPlayerLockScreenMiniController(__player);
-	__lockMini->create();
-	__lockMini->_signal.addListener([this](const char *event, const char *) { __onLockMiniEvent(event); });
+	__notiMini = memoVoiceMiniCreateN<MplayerNotiMiniController>(
+	    __player, [this](const char *event) { __onNotiMiniEvent(event); });
+	__lockMini = memoVoiceMiniCreateN<MPlayerLockScreenMiniController>(
+	    __player, [this](const char *event) { __onLockMiniEvent(event); });
 }
 
 void MemoPlayer::__destroyMiniControllers()
 {
-	if (__notiMini) {
-		__notiMini->hide();
-		delete __notiMini;
-		__notiMini = nullptr;
-	}
-	if (__lockMini) {
-		__lockMini->hide();
-		delete __lockMini;
-		__lockMini = nullptr;
-	}
+	memoVoiceMiniDelete(&__notiMini);
+	memoVoiceMiniDelete(&__lockMini);
 }
 
 void MemoPlayer::__setMiniTime(const char *text, int ms)
 {
-	if (__notiMini) {
-		if (ms >= HOUR_MS)
-			__notiMini->setTimeHour(text);
-		else
-			__notiMini->setTime(text);
-	}
-	if (__lockMini)
-		__lockMini->setTime(text);
+	memoVoiceMiniSetTime(__notiMini, __lockMini, text, ms);
 }
 
 void MemoPlayer::__refreshNotiMini()
 {
-	if (__notiMini)
-		__notiMini->update();
+	memoVoiceMiniUpdate(__notiMini);
 }
 
 void MemoPlayer::__refreshLockMini()
 {
-	if (__lockMini)
-		__lockMini->update();
+	memoVoiceMiniUpdate(__lockMini);
 }
 
 void MemoPlayer::__onNotiMiniEvent(const char *event)

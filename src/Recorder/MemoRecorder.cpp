@@ -7,26 +7,17 @@
 
 #include <Ecore_File.h>
 #include <WPopupController.h>
-#include <WUiTimer.h>
 #include <app_i18n.h>
 #include <notification.h>
 
 #include "MemoApp.h"
 #include "MemoLog.h"
-#include "Model/MemoBroadCaster.h"
-#include "Model/MemoPopupMonitor.h"
 #include "Recorder/MemoMprisPlayer.h"
 #include "Recorder/MemoVoicePanel.h"
 #include "Util/MemoUtil.h"
 
-using app_assist::WPopupController;
-using app_assist::WUiTimer;
-
 static const char *const RECORDER_GROUP = "memo_recorder";
 static const int PATH_MAX_LEN = 1024;
-static const int HOUR_MS = 3600000;
-// A tap is seen before what it starts.
-static const double TAP_DELAY = 0.1;
 
 int MemoRecorder::__timeLimitSeconds = 3600;
 
@@ -55,12 +46,7 @@ Evas_Object *MemoRecorder::onCreateView(Evas_Object *parent, void *param)
 	}
 	__makeFilePath(static_cast<const char *>(param));
 	__parent = parent;
-	elm_object_signal_emit(parent, "recorder,start", "elm");
-	Evas_Object *layout = elm_layout_add(parent);
-	elm_object_part_content_set(parent, "recorder_contents", layout);
-	if (!elm_layout_file_set(layout, MemoUtil::getEdjePath(), RECORDER_GROUP))
-		MEMO_LOGE("group %s not found", RECORDER_GROUP);
-	evas_object_show(layout);
+	Evas_Object *layout = memoVoiceAddPanelLayout(parent, RECORDER_GROUP);
 
 	__cancelBtn = __takePartObject("recorder_cancel_btn", __recorderDeletePopupCb);
 	__startBtn = __takePartObject("recorder_start_btn", __recorderCreateCb);
@@ -107,30 +93,17 @@ Evas_Object *MemoRecorder::__takePartObject(const char *part, Evas_Object_Event_
 void MemoRecorder::onCreated()
 {
 	__updateRecorderLayout();
-	if (__broadcastId == 0)
-		__broadcastId = MemoBroadCaster::getInstance().addListener(
-		    [this](const char *key, void *) { __recorderBroadCasterCb(key); }, getEvasObj());
+	memoVoiceAddBroadcastListener(
+	    &__broadcastId, [this](const char *key) { __recorderBroadCasterCb(key); }, getEvasObj());
 }
 
 void MemoRecorder::onDestroy()
 {
-	if (__recorder) {
-		// A take still running is given up: the file goes with it.
-		if (__isActive())
-			recorder_cancel(__recorder);
-		if (__getState() == RECORDER_STATE_READY)
-			recorder_unprepare(__recorder);
-		if (__getState() == RECORDER_STATE_CREATED) {
-			recorder_destroy(__recorder);
-			__recorder = nullptr;
-		}
-	}
+	// A take still running is given up: the file goes with it.
+	__discardTake();
 	__destroySession("onDestroy");
 	__stopMpris();
-	if (__callManager) {
-		cm_deinit(__callManager);
-		__callManager = nullptr;
-	}
+	memoVoiceEndCalls(&__callManager);
 	memoVoiceMediaKeyReleaseAsync();
 	if (__notiMini)
 		__sendMessagePort();
@@ -157,9 +130,7 @@ bool MemoRecorder::isRecordedEnough() const
 
 bool MemoRecorder::__isInCall()
 {
-	cm_call_status_e status = CM_CALL_STATUS_IDLE;
-	return __callManager && cm_get_call_status(__callManager, &status) == CM_ERROR_NONE &&
-	       status != CM_CALL_STATUS_IDLE;
+	return memoVoiceInCall(__callManager);
 }
 
 void MemoRecorder::__updateRecorderLayout()
@@ -179,7 +150,7 @@ void MemoRecorder::__updateRecorderLayout()
 		return;
 	}
 	const std::string signal = std::string(state == RECORDER_STATE_RECORDING ? "recorder,resumed" : "recorder,paused") +
-	                           (__elapsedMs < HOUR_MS ? "Minute" : "Hour") + orientation;
+	                           (__elapsedMs < MEMO_VOICE_HOUR_MS ? "Minute" : "Hour") + orientation;
 	elm_object_signal_emit(layout, "hide,recStartBtn", "elm");
 	elm_object_signal_emit(layout, signal.c_str(), "elm");
 }
@@ -202,13 +173,7 @@ void MemoRecorder::__recorderCreateCb(void *data, Evas *evas, Evas_Object *obj, 
 	MemoRecorder *self = static_cast<MemoRecorder *>(data);
 	MemoUtil::playTapFeedback();
 	memoVoiceMediaKeyReserveAsync(__media_key_event_cb, self);
-	WUiTimer::addTimer(
-	    TAP_DELAY,
-	    [self](void *) {
-		    self->__onStartTimer();
-		    return false;
-	    },
-	    nullptr, self->getEvasObj());
+	memoVoiceAfterTap(self->getEvasObj(), [self]() { self->__onStartTimer(); });
 }
 
 void MemoRecorder::__onStartTimer()
@@ -280,13 +245,7 @@ void MemoRecorder::recorderStopCb(void *data, Evas *evas, Evas_Object *obj, void
 
 void MemoRecorder::__stopLater()
 {
-	WUiTimer::addTimer(
-	    TAP_DELAY,
-	    [this](void *) {
-		    recorderStop();
-		    return false;
-	    },
-	    nullptr, getEvasObj());
+	memoVoiceAfterTap(getEvasObj(), [this]() { recorderStop(); });
 }
 
 void MemoRecorder::__recorderDeletePopupCb(void *data, Evas *evas, Evas_Object *obj, void *eventInfo)
@@ -307,27 +266,13 @@ void MemoRecorder::__recorderDeletePopupCb(void *data, Evas *evas, Evas_Object *
 		return;
 	}
 	self->__signal.emit("recorder,dicardPopUp", self->__fileUUID);
-	WUiTimer::addTimer(
-	    TAP_DELAY,
-	    [self](void *) {
-		    self->__showDiscardPopup();
-		    return false;
-	    },
-	    nullptr, self->getEvasObj());
+	memoVoiceAfterTap(self->getEvasObj(), [self]() { self->__showDiscardPopup(); });
 }
 
 // The take goes on while the question is up.
 void MemoRecorder::__showDiscardPopup()
 {
-	WPopupController *popup = new WPopupController();
-	popup->setTextTranslatable("memo-sub");
-	popup->setTitle("IDS_MEMO_HEADER_DISCARD_RECORDING_ABB2");
-	popup->setContent("IDS_MEMO_POP_RECORDING_WILL_BE_STOPPED_AND_THE_FILE_WILL_BE_DISCARDED");
-	popup->addButton("IDS_MEMO_BUTTON_CANCEL", std::function<void(bool *)>());
-	popup->addButton("IDS_MEMO_SK_OK", [this](bool *close) {
-		__recorderCancel();
-		*close = true;
-	});
-	MemoPopupMonitor::getInstance()->addPopup(popup);
-	attachPopup(popup);
+	attachPopup(memoVoiceConfirmPopupN("IDS_MEMO_HEADER_DISCARD_RECORDING_ABB2",
+	                                   "IDS_MEMO_POP_RECORDING_WILL_BE_STOPPED_AND_THE_FILE_WILL_BE_DISCARDED",
+	                                   "IDS_MEMO_SK_OK", [this]() { __recorderCancel(); }));
 }

@@ -8,14 +8,10 @@
 #include <notification.h>
 
 #include "MemoLog.h"
-#include "Model/MemoBroadCaster.h"
 #include "Model/MemoPopupMonitor.h"
 #include "Recorder/MRecorderLockScreenMiniController.h"
 #include "Recorder/MRecorderNotiMiniController.h"
 #include "Recorder/MemoVoicePanel.h"
-
-// From one hour on the notification controller shows the time in its hour part.
-static const unsigned long long HOUR_MS = 3600000;
 
 void MemoRecorder::__recorderBroadCasterCb(const char *key)
 {
@@ -43,9 +39,7 @@ void MemoRecorder::__recorderBroadCasterCb(const char *key)
 
 void MemoRecorder::__removeBroadcastListener()
 {
-	if (__broadcastId)
-		MemoBroadCaster::getInstance().removeListener(__broadcastId);
-	__broadcastId = 0;
+	memoVoiceRemoveBroadcastListener(&__broadcastId);
 }
 
 // The indicator shows a take running or paused while the app is in the background.
@@ -73,10 +67,7 @@ void MemoRecorder::__media_key_event_cb(media_key_e key, media_key_event_e statu
 		MEMO_LOGE("Memo Recorder Handler is NULL");
 		return;
 	}
-	if (key != MEDIA_KEY_MEDIA)
-		return;
-	self->__mediaKeyPressed = !self->__mediaKeyPressed;
-	if (!self->__mediaKeyPressed && self->__isActive())
+	if (memoVoiceMediaKeyToggled(key, &self->__mediaKeyPressed) && self->__isActive())
 		__pauseResumeCb(self, nullptr, nullptr, nullptr);
 }
 
@@ -98,50 +89,31 @@ void MemoRecorder::_soundActiveDeviceChangedCb(sound_device_in_e in, sound_devic
 
 void MemoRecorder::__createMiniControllers()
 {
-	__notiMini = new MRecorderNotiMiniController(__recorder);
-	__notiMini->create();
-	__notiMini->_signal.addListener([this](const char *event, const char *) { __onNotiMiniEvent(event); });
-	__lockMini = new MRecorderLockScreenMiniController(__recorder);
-	__lockMini->create();
-	__lockMini->_signal.addListener([this](const char *event, const char *) { __onLockMiniEvent(event); });
+	__notiMini = memoVoiceMiniCreateN<MRecorderNotiMiniController>(
+	    __recorder, [this](const char *event) { __onNotiMiniEvent(event); });
+	__lockMini = memoVoiceMiniCreateN<MRecorderLockScreenMiniController>(
+	    __recorder, [this](const char *event) { __onLockMiniEvent(event); });
 }
 
 void MemoRecorder::__destroyMiniControllers()
 {
-	if (__lockMini) {
-		__lockMini->hide();
-		delete __lockMini;
-		__lockMini = nullptr;
-	}
-	if (__notiMini) {
-		__notiMini->hide();
-		delete __notiMini;
-		__notiMini = nullptr;
-	}
+	memoVoiceMiniDelete(&__lockMini);
+	memoVoiceMiniDelete(&__notiMini);
 }
 
 void MemoRecorder::__setMiniTime(const char *text, unsigned long long ms)
 {
-	if (__notiMini) {
-		if (ms < HOUR_MS)
-			__notiMini->setTime(text);
-		else
-			__notiMini->setTimeHour(text);
-	}
-	if (__lockMini)
-		__lockMini->setTime(text);
+	memoVoiceMiniSetTime(__notiMini, __lockMini, text, static_cast<long long>(ms));
 }
 
 void MemoRecorder::__refreshNotiMini()
 {
-	if (__notiMini)
-		__notiMini->update();
+	memoVoiceMiniUpdate(__notiMini);
 }
 
 void MemoRecorder::__refreshLockMini()
 {
-	if (__lockMini)
-		__lockMini->update();
+	memoVoiceMiniUpdate(__lockMini);
 }
 
 void MemoRecorder::__onNotiMiniEvent(const char *event)

@@ -120,10 +120,7 @@ void MemoRecorder::recorderStop()
 	__filePath = nullptr;
 	__removeBroadcastListener();
 	__destroySession(__func__);
-	if (__callManager) {
-		cm_deinit(__callManager);
-		__callManager = nullptr;
-	}
+	memoVoiceEndCalls(&__callManager);
 	memoVoiceMediaKeyReleaseAsync();
 	elm_object_signal_emit(getEvasObj(), "recorder,cancel", "elm");
 	__stopMpris();
@@ -134,29 +131,31 @@ void MemoRecorder::recorderStop()
 	}
 }
 
+// recorder_cancel removes the file of a running take; the handle goes once it is back to created.
+void MemoRecorder::__discardTake()
+{
+	if (!__recorder)
+		return;
+	if (__isActive())
+		recorder_cancel(__recorder);
+	if (__getState() == RECORDER_STATE_READY)
+		recorder_unprepare(__recorder);
+	if (__getState() == RECORDER_STATE_CREATED) {
+		recorder_destroy(__recorder);
+		__recorder = nullptr;
+	}
+}
+
 void MemoRecorder::__recorderCancel()
 {
 	memoVoiceMediaKeyReleaseAsync();
-	if (__recorder) {
-		// recorder_cancel removes the file.
-		if (__isActive())
-			recorder_cancel(__recorder);
-		if (__getState() == RECORDER_STATE_READY)
-			recorder_unprepare(__recorder);
-		if (__getState() == RECORDER_STATE_CREATED) {
-			recorder_destroy(__recorder);
-			__recorder = nullptr;
-		}
-	}
+	__discardTake();
 	free(__filePath);
 	__filePath = nullptr;
 	elm_object_signal_emit(getEvasObj(), "recorder,cancel", "elm");
 	__removeBroadcastListener();
 	__destroySession(__func__);
-	if (__callManager) {
-		cm_deinit(__callManager);
-		__callManager = nullptr;
-	}
+	memoVoiceEndCalls(&__callManager);
 	__stopMpris();
 	__signal.emit("recorder,delete", __fileUUID);
 	app_assist::WUiTimer::addTimer(

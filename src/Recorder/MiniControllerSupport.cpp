@@ -1,5 +1,7 @@
 #include "MiniControllerSupport.h"
 
+#include <Ecore_X.h>
+
 #include <app.h>
 #include <app_manager.h>
 #include <system_info.h>
@@ -8,6 +10,7 @@
 #include <cstdlib>
 
 #include "MemoLog.h"
+#include "Util/MemoUtil.h"
 
 namespace mini_controller
 {
@@ -52,6 +55,78 @@ bool addPartMouseUp(Evas_Object *layout, const char *part, Evas_Object_Event_Cb 
 		return false;
 	}
 	evas_object_event_callback_add(obj, EVAS_CALLBACK_MOUSE_UP, cb, data);
+	return true;
+}
+
+bool addButton(Evas_Object *layout, const char *part, Evas_Object_Event_Cb cb, void *data)
+{
+	if (!layout) {
+		MEMO_LOGE("getEvasObj() is nullptr");
+		return false;
+	}
+	return addPartMouseUp(layout, part, cb, data);
+}
+
+Evas_Object *createNotiWindow(const char *name, minicontrol_event_cb cb, int *rotation)
+{
+	Evas_Object *win = minicontrol_create_window(name, MINICONTROL_TARGET_VIEWER_QUICK_PANEL, cb);
+	*rotation = elm_win_rotation_get(win);
+	elm_win_alpha_set(win, EINA_TRUE);
+	evas_object_resize(win, panelWidth(*rotation), scaled(NOTI_HEIGHT));
+	evas_object_show(win);
+	return win;
+}
+
+namespace
+{
+// The lock screen sends nothing that its controllers act on.
+void lockWindowEventCb(minicontrol_viewer_event_e, bundle *) {}
+} // namespace
+
+Evas_Object *createLockWindow(const char *name)
+{
+	Evas_Object *win = minicontrol_create_window(name, MINICONTROL_TARGET_VIEWER_STOCK_LOCK_SCREEN, lockWindowEventCb);
+	elm_win_alpha_set(win, EINA_TRUE);
+	evas_object_resize(win, lockWidth(win), scaled(LOCK_HEIGHT));
+	evas_object_show(win);
+	return win;
+}
+
+Evas_Object *addLayout(Evas_Object *win, const char *group)
+{
+	Evas_Object *layout = elm_layout_add(win);
+	elm_layout_file_set(layout, MemoUtil::getEdjePath(), group);
+	evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
+	evas_object_show(layout);
+	elm_win_resize_object_add(win, layout);
+	return layout;
+}
+
+void deleteWindow(Evas_Object **win, Evas_Object **layout)
+{
+	if (*win) {
+		evas_object_hide(*win);
+		evas_object_del(*win);
+	}
+	*win = nullptr;
+	*layout = nullptr;
+}
+
+void deleteHandler(Ecore_Event_Handler **handler)
+{
+	if (*handler)
+		ecore_event_handler_del(*handler);
+	*handler = nullptr;
+}
+
+bool rotateNotiWindow(Evas_Object *win, int *rotation, void *event)
+{
+	Ecore_X_Event_Client_Message *ev = static_cast<Ecore_X_Event_Client_Message *>(event);
+	if (ev->message_type != ECORE_X_ATOM_E_ILLUME_ROTATE_ROOT_ANGLE || ev->data.l[0] == *rotation)
+		return false;
+	int angle = static_cast<int>(ev->data.l[0]);
+	evas_object_resize(win, panelWidth(angle), scaled(NOTI_HEIGHT));
+	*rotation = angle;
 	return true;
 }
 

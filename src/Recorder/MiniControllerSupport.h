@@ -2,7 +2,9 @@
 #ifndef SRC_RECORDER_MINICONTROLLERSUPPORT_H
 #define SRC_RECORDER_MINICONTROLLERSUPPORT_H
 
+#include <Ecore.h>
 #include <Elementary.h>
+#include <minicontrol-provider.h>
 
 namespace mini_controller
 {
@@ -27,6 +29,22 @@ int lockWidth(Evas_Object *win);
 Evas_Object *partObject(Evas_Object *layout, const char *part);
 // Adds an evas mouse-up callback on the part object; false when the layout or the part is missing.
 bool addPartMouseUp(Evas_Object *layout, const char *part, Evas_Object_Event_Cb cb, void *data);
+// Adds a mouse-up button on the part; a missing layout logs "getEvasObj() is nullptr" and adds nothing.
+bool addButton(Evas_Object *layout, const char *part, Evas_Object_Event_Cb cb, void *data);
+// Makes the quick panel's window: see-through, as wide as the panel at its rotation (stored in *rotation),
+// shown.
+Evas_Object *createNotiWindow(const char *name, minicontrol_event_cb cb, int *rotation);
+// Makes the lock screen's window, which acts on no viewer event: see-through, at the lock-screen size, shown.
+Evas_Object *createLockWindow(const char *name);
+// Fills the window with a shown layout of the theme's group.
+Evas_Object *addLayout(Evas_Object *win, const char *group);
+// Hides and deletes *win if any and nulls both it and the layout inside it.
+void deleteWindow(Evas_Object **win, Evas_Object **layout);
+// Deletes *handler if any and nulls it.
+void deleteHandler(Ecore_Event_Handler **handler);
+// On a root rotation message to an angle other than *rotation, resizes the quick panel's window to the new
+// width and stores the angle; true when it did.
+bool rotateNotiWindow(Evas_Object *win, int *rotation, void *event);
 // Emits the signal with the source "elm".
 void emit(Evas_Object *layout, const char *signal);
 // Brings this app back to the front and releases the lock screen (the title of the notification windows).

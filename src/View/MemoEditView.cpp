@@ -19,6 +19,7 @@
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
 #include "Util/MemoUtil.h"
+#include "MemoViewParts.h"
 
 using app_assist::WUiTimer;
 
@@ -90,9 +91,8 @@ Evas_Object *MemoEditView::onCreateView(Evas_Object *parent, void *param)
 		MEMO_LOGE("parent object is NULL");
 		return nullptr;
 	}
-	Evas_Object *layout = elm_layout_add(parent);
-	evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	if (!elm_layout_file_set(layout, MemoUtil::getEdjePath(), EDIT_VIEW_GROUP))
+	Evas_Object *layout = nullptr;
+	if (!memoViewPageLayoutAdd(parent, EDIT_VIEW_GROUP, &layout))
 		MEMO_LOGE("group %s not found", EDIT_VIEW_GROUP);
 	if (__mode == MODE_VIEW) {
 		elm_object_signal_emit(layout, "change,view", "elm");

@@ -8,10 +8,10 @@
 #include <WNaviframeController.h>
 
 #include "MemoLog.h"
-#include "Util/MemoUtil.h"
 #include "View/MemoHiddenPasswordView.h"
 #include "View/MemoHiddenTitle.h"
 #include "View/MemoListView.h"
+#include "MemoViewParts.h"
 
 namespace
 {
@@ -48,9 +48,8 @@ Evas_Object *MemoHiddenFirstAccess::onCreateView(Evas_Object *parent, void *para
 		__parent->__hideFloatingButton();
 		__parent->__isTopView = false;
 	}
-	Evas_Object *layout = elm_layout_add(parent);
-	evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	if (!elm_layout_file_set(layout, MemoUtil::getEdjePath(), "hidden.mode.first"))
+	Evas_Object *layout = nullptr;
+	if (!memoViewPageLayoutAdd(parent, "hidden.mode.first", &layout))
 		MEMO_LOGE("group hidden.mode.first not found");
 	elm_object_domain_translatable_part_text_set(layout, "welcome_head", "memo-sub",
 	                                             "IDS_MEMO_HEADER_USING_HIDDEN_MODE_ABB");

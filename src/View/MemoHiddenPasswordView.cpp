@@ -9,9 +9,9 @@
 
 #include "DataBase/MemoDbMgr.h"
 #include "MemoLog.h"
-#include "Util/MemoUtil.h"
 #include "View/MemoHiddenPinLock.h"
 #include "View/MemoHiddenTitle.h"
+#include "MemoViewParts.h"
 
 namespace
 {
@@ -92,9 +92,7 @@ Evas_Object *MemoHiddenPasswordView::onCreateView(Evas_Object *parent, void *par
 	if (MemoDbMgr::getInstance()->getHiddenMemoPassword(stored))
 		__isCreateMode = false;
 
-	__layout = elm_layout_add(parent);
-	evas_object_size_hint_weight_set(__layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	if (!elm_layout_file_set(__layout, MemoUtil::getEdjePath(), LAYOUT_GROUP))
+	if (!memoViewPageLayoutAdd(parent, LAYOUT_GROUP, &__layout))
 		MEMO_LOGE("group %s not found", LAYOUT_GROUP);
 	__setBarText(__isCreateMode ? "IDS_MEMO_HEADER_CREATE_PIN" : "IDS_MEMO_HEADER_ENTER_PIN");
 	for (int i = 0; i < PIN_LENGTH; i++)

@@ -1,10 +1,8 @@
 // The hidden memos' page: the grid or the empty state, the editor on a tap, the floating button, the way back.
 #include "View/MemoHiddenView.h"
 
-#include <cstdlib>
 #include <cstring>
 
-#include <eext_floatingbutton.h>
 #include <efl_extension.h>
 
 #include <WNaviframeController.h>
@@ -15,9 +13,9 @@
 #include "List/MemoGridControl.h"
 #include "List/MemoGridItem.h"
 #include "MemoLog.h"
-#include "Util/MemoUtil.h"
 #include "View/MemoEditView.h"
 #include "View/MemoHiddenTitle.h"
+#include "MemoViewParts.h"
 
 namespace
 {
@@ -48,9 +46,7 @@ Evas_Object *MemoHiddenView::onCreateView(Evas_Object *parent, void *param)
 		MEMO_LOGE("parent object is NULL");
 		return nullptr;
 	}
-	__layout = elm_layout_add(parent);
-	evas_object_size_hint_weight_set(__layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	elm_layout_file_set(__layout, MemoUtil::getEdjePath(), "list_view");
+	memoViewPageLayoutAdd(parent, "list_view", &__layout);
 	eext_object_event_callback_add(__layout, EEXT_CALLBACK_BACK, __backBtnCb, this);
 	eext_object_event_callback_add(__layout, EEXT_CALLBACK_MORE, __moreBtnSelectCb, this);
 	__updateGrid();
@@ -113,17 +109,7 @@ void MemoHiddenView::__updateGrid()
 
 Evas_Object *MemoHiddenView::__createNoContentLayout(Evas_Object *parent)
 {
-	Evas_Object *layout = elm_layout_add(parent);
-	elm_layout_theme_set(layout, "layout", "nocontents", "default");
-	evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	evas_object_size_hint_align_set(layout, EVAS_HINT_FILL, EVAS_HINT_FILL);
-	elm_object_domain_translatable_part_text_set(layout, "elm.text", "memo-sub", "IDS_MEMO_BODY_NO_MEMOS_ABB");
-	elm_object_domain_translatable_part_text_set(layout, "elm.help.text", "memo-sub",
-	                                             "IDS_MEMO_BODY_AFTER_YOU_CREATE_MEMOS_THEY_WILL_BE_SHOWN_HERE");
-	elm_object_signal_emit(layout, "text,disabled", "");
-	elm_object_signal_emit(layout, "align.center", "elm");
-	evas_object_show(layout);
-	return layout;
+	return memoViewNoContentLayoutAdd(parent, "memo-sub", "IDS_MEMO_BODY_NO_MEMOS_ABB");
 }
 
 void MemoHiddenView::__onSelected(MemoGridItem *item)
@@ -166,20 +152,9 @@ void MemoHiddenView::__showFloatingButton()
 		return;
 	}
 	if (!__floatingBtn) {
-		__floatingBtn = eext_floatingbutton_add(baseLayout);
+		__floatingBtn = memoViewNewMemoFloatingButtonAdd(baseLayout, __newMemoBtnCb, this);
 		if (!__floatingBtn)
 			return;
-		eext_floatingbutton_mode_set(__floatingBtn, EEXT_FLOATINGBUTTON_MODE_BOTH_SIDES);
-		Evas_Object *button = elm_button_add(__floatingBtn);
-		elm_object_style_set(button, "memo_floating");
-		elm_object_part_content_set(__floatingBtn, "button1", button);
-		Evas_Object *icon = elm_image_add(button);
-		char *path = MemoUtil::getImageResourcePathN("core_floating_button_icon.png");
-		if (path)
-			elm_image_file_set(icon, path, nullptr);
-		free(path);
-		elm_object_part_content_set(button, "icon", icon);
-		evas_object_smart_callback_add(button, "clicked", __newMemoBtnCb, this);
 		// Whoever fills the part next deletes what is left in it.
 		evas_object_event_callback_add(
 		    __floatingBtn, EVAS_CALLBACK_DEL,

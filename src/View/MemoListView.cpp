@@ -15,7 +15,7 @@
 #include "MemoApp.h"
 #include "MemoLog.h"
 #include "Model/MemoBroadCaster.h"
-#include "Util/MemoUtil.h"
+#include "MemoViewParts.h"
 
 using app_assist::WUiTimer;
 
@@ -65,9 +65,7 @@ Evas_Object *MemoListView::onCreateView(Evas_Object *parent, void *param)
 			__isPickMode = true;
 		free(operation);
 	}
-	__layout = elm_layout_add(parent);
-	evas_object_size_hint_weight_set(__layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	elm_layout_file_set(__layout, MemoUtil::getEdjePath(), "list_view");
+	memoViewPageLayoutAdd(parent, "list_view", &__layout);
 	elm_object_signal_emit(__layout, "custom,naviframe,show", "elm");
 	return __layout;
 }
@@ -197,17 +195,7 @@ bool MemoListView::__isTop()
 
 Evas_Object *MemoListView::__createNoContentLayout(Evas_Object *parent)
 {
-	Evas_Object *layout = elm_layout_add(parent);
-	elm_layout_theme_set(layout, "layout", "nocontents", "default");
-	evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	evas_object_size_hint_align_set(layout, EVAS_HINT_FILL, EVAS_HINT_FILL);
-	elm_object_domain_translatable_part_text_set(layout, "elm.text", "memo", "IDS_MEMO_NPBODY_NO_MEMOS");
-	elm_object_domain_translatable_part_text_set(layout, "elm.help.text", "memo",
-	                                             "IDS_MEMO_BODY_AFTER_YOU_CREATE_MEMOS_THEY_WILL_BE_SHOWN_HERE");
-	elm_object_signal_emit(layout, "text,disabled", "");
-	elm_object_signal_emit(layout, "align.center", "elm");
-	evas_object_show(layout);
-	return layout;
+	return memoViewNoContentLayoutAdd(parent, "memo", "IDS_MEMO_NPBODY_NO_MEMOS");
 }
 
 void MemoListView::__broadCasterCb(const char *key, void *data)

@@ -1,10 +1,7 @@
 // The list's ways on: the floating button for a new memo (or the storage-full popup), and the more menu.
 #include "View/MemoListView.h"
 
-#include <cstdlib>
-
 #include <app_i18n.h>
-#include <eext_floatingbutton.h>
 #include <notification_status.h>
 
 #include <WMenuPopupController.h>
@@ -17,6 +14,7 @@
 #include "Model/MemoPopupMonitor.h"
 #include "Util/MemoUtil.h"
 #include "View/MemoStorageFull.h"
+#include "MemoViewParts.h"
 
 using app_assist::WMenuPopupController;
 using app_assist::WPopupController;
@@ -40,24 +38,11 @@ void MemoListView::__showFloatingButton()
 		return;
 	}
 	if (!__floatingBtn) {
-		__floatingBtn = eext_floatingbutton_add(baseLayout);
+		__floatingBtn = memoViewNewMemoFloatingButtonAdd(baseLayout, __newMemoBtnCb, this);
 		if (!__floatingBtn)
 			return;
-		eext_floatingbutton_mode_set(__floatingBtn, EEXT_FLOATINGBUTTON_MODE_BOTH_SIDES);
-		elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
-		Evas_Object *button = elm_button_add(__floatingBtn);
-		elm_object_style_set(button, "memo_floating");
-		elm_object_part_content_set(__floatingBtn, "button1", button);
-		Evas_Object *icon = elm_image_add(button);
-		char *path = MemoUtil::getImageResourcePathN("core_floating_button_icon.png");
-		if (path)
-			elm_image_file_set(icon, path, nullptr);
-		free(path);
-		elm_object_part_content_set(button, "icon", icon);
-		evas_object_smart_callback_add(button, "clicked", __newMemoBtnCb, this);
-	} else {
-		elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
 	}
+	elm_object_part_content_set(baseLayout, FLOATING_BUTTON_PART, __floatingBtn);
 	evas_object_show(__floatingBtn);
 }
 

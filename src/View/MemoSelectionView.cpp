@@ -15,6 +15,7 @@
 #include "List/MemoItemList.h"
 #include "MemoLog.h"
 #include "Util/MemoUtil.h"
+#include "MemoViewParts.h"
 
 namespace
 {
@@ -46,9 +47,8 @@ Evas_Object *MemoSelectionView::onCreateView(Evas_Object *parent, void *param)
 		MEMO_LOGE("parent object is NULL");
 		return nullptr;
 	}
-	Evas_Object *layout = elm_layout_add(parent);
-	evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	elm_layout_file_set(layout, MemoUtil::getEdjePath(), "memo.delete.view");
+	Evas_Object *layout = nullptr;
+	memoViewPageLayoutAdd(parent, "memo.delete.view", &layout);
 
 	__selectAllRow = elm_layout_add(layout);
 	elm_layout_theme_set(__selectAllRow, "genlist", "item", "select_all/default");

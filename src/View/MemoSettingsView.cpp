@@ -10,11 +10,11 @@
 
 #include "DataBase/MemoDbMgr.h"
 #include "MemoLog.h"
-#include "Util/MemoUtil.h"
 #include "View/MemoHiddenFirstAccess.h"
 #include "View/MemoHiddenPasswordView.h"
 #include "View/MemoHiddenTitle.h"
 #include "View/MemoListView.h"
+#include "MemoViewParts.h"
 
 MemoSettingsView::MemoSettingsView(MemoListView *parent)
     : __parent(parent), __genlist(nullptr), __row(nullptr), __rowTextId("IDS_MEMO_TMBODY_HIDDEN_MODE"), __clickCount(0),
@@ -34,9 +34,8 @@ Evas_Object *MemoSettingsView::onCreateView(Evas_Object *parent, void *param)
 		MEMO_LOGE("parent object is NULL");
 		return nullptr;
 	}
-	Evas_Object *layout = elm_layout_add(parent);
-	evas_object_size_hint_weight_set(layout, EVAS_HINT_EXPAND, EVAS_HINT_EXPAND);
-	if (!elm_layout_file_set(layout, MemoUtil::getEdjePath(), "memo.settings"))
+	Evas_Object *layout = nullptr;
+	if (!memoViewPageLayoutAdd(parent, "memo.settings", &layout))
 		MEMO_LOGE("group memo.settings not found");
 	__genlist = elm_genlist_add(layout);
 	elm_genlist_mode_set(__genlist, ELM_LIST_COMPRESS);
