@@ -1,6 +1,11 @@
 #ifndef INC_LIST_MEMOGRIDCONTROL_H
 #define INC_LIST_MEMOGRIDCONTROL_H
 
+#include <functional>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include <Elementary.h>
@@ -11,6 +16,7 @@
 class MemoGridItem;
 class MemoItemList;
 class MemoDocInfo;
+struct MemoGridSearchJob;
 
 // The memo grid: one elm_gengrid with a MemoGridItem per record. The owner's grid mode (see create) picks the
 // store read; the control sizes the cells for scale and orientation, keeps the scroll position across a
@@ -33,6 +39,14 @@ public:
 	// Rebuilds the grid with the matches of keyword among the current records, in the search's order, and
 	// writes their number to outCount.
 	void searchGrid(const char *keyword, int *outCount);
+	// As searchGrid, with the store's search on a worker thread: the grid changes when the result is back, and
+	// then done gets the keyword and the count on the main loop. Texts asked for while a search runs are not
+	// searched, except the latest one, after it; a result overtaken by a newer text is dropped. searchGrid
+	// drops what this has started.
+	void searchGridLater(const char *keyword);
+	void setSearchDoneCb(std::function<void(const char *keyword, int count)> done) { __searchDone = std::move(done); }
+	// True while a searchGridLater has not reached the grid yet.
+	bool isSearchPending() const { return __searchJob != nullptr; }
 	// Replaces the records with a fresh read of the visible memos, whatever the mode.
 	void reloadItems();
 	// The cards of the last update; the list cells are the control's, the cards the gengrid's.
@@ -56,11 +70,32 @@ public:
 
 private:
 	void __setGridSize(Evas_Object *gengrid);
-	void __appendItem(MemoDocInfo *record, int row, const char *keyword);
-	// MemoGridControlSearch.cpp: turns the search grid's cards into those of `records` by deleting the others
-	// and giving the rest the keyword; false (nothing changed) when a card of records is missing or the
-	// order differs.
-	bool __reconcileSearchItems(const std::vector<MemoDocInfo *> &records, const char *keyword);
+	// The card made, or null.
+	MemoGridItem *__appendItem(MemoDocInfo *record, int row, const char *keyword, Elm_Object_Item *before = nullptr);
+	// A card on the gengrid, with the row of __itemList that it shows.
+	struct Card {
+		int row;
+		MemoGridItem *item;
+		Elm_Object_Item *objectItem;
+	};
+	// MemoGridControlSearch.cpp: the rows of the store's result (the UUIDs are freed), the cards they need, and
+	// the cards that come as the view nears the end of those made.
+	std::vector<int> __rowsOfResult(char **uuids, int count, int listRows);
+	void __showRows(std::vector<int> rows, const char *keyword, int listRows);
+	void __fillLazily(int rows);
+	size_t __cardsPerLoad();
+	void __loadMoreCards();
+	void __forgetCards();
+	static void __nearEndCb(void *data, Evas_Object *obj, void *eventInfo);
+	static void __resizedCb(void *data, Evas *evas, Evas_Object *obj, void *eventInfo);
+	// MemoGridSearchQuery.cpp: the query on a worker and what may spare it.
+	bool __searchCannotMatch(const char *keyword);
+	void __keepSearch(const char *keyword, int count, bool ok, std::pair<long long, long long> stamp);
+	void __startSearchJob(const char *keyword);
+	void __onSearchJobEnd(MemoGridSearchJob *job);
+	void __dropSearchJob(bool wait);
+	static void __searchJobCb(void *data, Ecore_Thread *thread);
+	static void __searchJobEndCb(void *data, Ecore_Thread *thread);
 	int __getItemType(MemoDocInfo *record);
 	static void __scrollCb(void *data, Evas_Object *obj, void *eventInfo);
 	static void __pressedItemCb(void *data, Evas_Object *obj, void *eventInfo);
@@ -76,8 +111,28 @@ private:
 	bool __scrolledInPortrait;
 	bool __scrolledInLandscape;
 	int __scrollEventCount;
-	// The gengrid holds the cards of a search (each with the keyword), not those of a full update.
-	bool __searchShown = false;
+	// The rows that the grid shows, in order: a search's matches (cards with the keyword) or the rows of a full
+	// update (cards with their row). __cards are the gengrid's cards, for the first of them; in the search
+	// modes the others come as the view nears the end (a gengrid's every change costs in proportion to its
+	// cards, so it holds few of them).
+	std::vector<int> __targetRows;
+	bool __targetSearch = false;
+	std::string __targetKeyword;
+	std::vector<Card> __cards;
+	bool __watchingEnd = false;
+	// The row of each UUID of __itemList, made on the first search over it.
+	std::unordered_map<std::string_view, int> __rowOfUuid;
+	// The query running on a worker, a newer text waiting for it, and the last result the store gave.
+	MemoGridSearchJob *__searchJob = nullptr;
+	bool __hasQueuedKeyword = false;
+	std::string __queuedKeyword;
+	std::function<void(const char *, int)> __searchDone;
+	struct {
+		bool valid = false;
+		std::string text;
+		int count = 0;
+		std::pair<long long, long long> stamp;
+	} __lastSearch;
 
 	// Shared by every grid of the process: a new grid forgets the position of the others.
 	static int savedScrollX;

@@ -10,6 +10,7 @@
 #include <uxt_edit_field.h>
 #include <uxt_theme.h>
 
+#include "List/MemoGridControl.h"
 #include "MemoLog.h"
 #include "Util/MemoUtil.h"
 
@@ -87,7 +88,8 @@ void MemoSearchView::__entryChangedCb(void *data, Evas_Object *obj, void *eventI
 	free(self->__lastEntryText);
 	self->__lastEntryText = strdup(text ? text : "");
 	free(text);
-	self->__search(self->__lastEntryText);
+	// The store's search runs on a worker; the grid and the no-result layout follow when it is back.
+	self->__grid->searchGridLater(self->__lastEntryText);
 }
 
 void MemoSearchView::__entryActivatedCb(void *data, Evas_Object *obj, void *eventInfo)
