@@ -16,9 +16,9 @@
 
 namespace
 {
-// Cards made at a time: at least three screens of them at any scale and orientation.
+// Cards made at a time: at least two screens of them at any scale and orientation.
 const size_t CARDS_PER_LOAD = 48;
-const int SCREENS_PER_LOAD = 3;
+const int SCREENS_PER_LOAD = 2;
 } // namespace
 
 void MemoGridControl::searchGrid(const char *keyword, int *outCount)
@@ -194,10 +194,14 @@ void MemoGridControl::__nearEndCb(void *data, Evas_Object *obj, void *eventInfo)
 	MemoGridControl *self = static_cast<MemoGridControl *>(data);
 	if (!self || self->__cards.size() >= self->__targetRows.size())
 		return;
-	Evas_Coord y = 0, h = 0, childH = 0;
-	elm_scroller_region_get(obj, nullptr, &y, nullptr, &h);
-	elm_scroller_child_size_get(obj, nullptr, &childH);
-	if (y + 2 * h >= childH)
+	// The height of the cards made, from the cell size: the scroller's own figure lags until the next frame.
+	Evas_Coord y = 0, w = 0, h = 0, itemW = 0, itemH = 0;
+	elm_scroller_region_get(obj, nullptr, &y, nullptr, nullptr);
+	evas_object_geometry_get(obj, nullptr, nullptr, &w, &h);
+	elm_gengrid_item_size_get(obj, &itemW, &itemH);
+	const Evas_Coord perRow = itemW > 0 ? std::max(1, w / itemW) : 1;
+	const Evas_Coord made = static_cast<Evas_Coord>((self->__cards.size() + perRow - 1) / perRow) * itemH;
+	if (h > 0 && y + 2 * h >= made)
 		self->__loadMoreCards();
 }
 

@@ -29,6 +29,24 @@ protected:
 		ASSERT_NE(nullptr, top<MemoSearchView>());
 		focus(entry());
 	}
+	// Keys into the field, then the wait for the store's search, which runs on a worker.
+	void typed(const char *text)
+	{
+		typeText(text);
+		settle();
+	}
+	void pressed(const char *key)
+	{
+		pressKey(key);
+		settle();
+	}
+	void settle()
+	{
+		waitFor([&] {
+			MemoSearchView *view = top<MemoSearchView>();
+			return !view || !view->isSearchPending();
+		});
+	}
 	Evas_Object *entry() { return elm_object_part_content_get(titleContent("title"), "elm.swallow.searchbar"); }
 	std::vector<std::string> shown() { return titlesIn(gridIn(top<MemoSearchView>()->getEvasObj())); }
 	// The text of part of the first result's card, after a render.
@@ -61,15 +79,15 @@ TEST_F(SearchViewTest, eachKeyNarrowsBackSpaceWidensAndHiddenMemosStayOut)
 	                                                     {"Planet"}};
 	const char *keys = "plane";
 	for (size_t i = 0; i < steps.size(); ++i) {
-		typeText(std::string(1, keys[i]).c_str());
+		typed(std::string(1, keys[i]).c_str());
 		EXPECT_EQ(steps[i], shown()) << "after " << i + 1 << " keys";
 	}
 	for (int i = 3; i >= 0; --i) {
-		pressKey("BackSpace");
+		pressed("BackSpace");
 		EXPECT_EQ(steps[i], shown()) << "after BackSpace to " << i + 1 << " keys";
 	}
 	// Emptied, the field lists every visible memo again.
-	pressKey("BackSpace");
+	pressed("BackSpace");
 	EXPECT_EQ(6u, shown().size());
 
 	// From the hidden view (grid mode 5) the hidden memo is a result too.
@@ -78,7 +96,7 @@ TEST_F(SearchViewTest, eachKeyNarrowsBackSpaceWidensAndHiddenMemosStayOut)
 	ASSERT_TRUE(naviframe()->push(hiddenSearch));
 	runFor(0.5);
 	focus(entry());
-	typeText("plane");
+	typed("plane");
 	EXPECT_EQ((std::vector<std::string>{"Planetarium", "Planet"}), shown());
 }
 
@@ -89,7 +107,7 @@ TEST_F(SearchViewTest, matchesAreHighlightedAndWildcardsActAsTheStatementSays)
 	addMemo(TestMemo("Other", "nothing here"));
 	openSearch();
 
-	typeText("AB");
+	typed("AB");
 	ASSERT_EQ((std::vector<std::string>{"cab Abby bread"}), shown());
 	const std::string title = cardPart("title"), body = cardPart("text");
 	const std::string mark = tagBefore(title, "ab");
@@ -101,22 +119,22 @@ TEST_F(SearchViewTest, matchesAreHighlightedAndWildcardsActAsTheStatementSays)
 	EXPECT_NE(std::string::npos, body.find("<br/>")) << body;
 
 	// In the body a match would fall inside the line break only: it stays whole and unmarked.
-	pressKey("BackSpace");
-	pressKey("BackSpace");
-	typeText("br");
+	pressed("BackSpace");
+	pressed("BackSpace");
+	typed("br");
 	EXPECT_EQ(std::string::npos, cardPart("text").find(mark)) << cardPart("text");
 	EXPECT_NE(std::string::npos, cardPart("text").find("<br/>"));
 
 	// "%" and "_" are wildcards of the pattern; a quote is doubled and matches itself.
-	pressKey("BackSpace");
-	pressKey("BackSpace");
-	typeText("%");
+	pressed("BackSpace");
+	pressed("BackSpace");
+	typed("%");
 	EXPECT_EQ(3u, shown().size());
-	pressKey("BackSpace");
-	typeText("_");
+	pressed("BackSpace");
+	typed("_");
 	EXPECT_EQ(3u, shown().size());
-	pressKey("BackSpace");
-	typeText("'");
+	pressed("BackSpace");
+	typed("'");
 	EXPECT_EQ((std::vector<std::string>{"Tom's list"}), shown());
 }
 
@@ -124,7 +142,7 @@ TEST_F(SearchViewTest, noResultLayoutAndTheEditorKeepTheQuery)
 {
 	addMemos();
 	openSearch();
-	typeText("qqq");
+	typed("qqq");
 	Evas_Object *content = elm_object_part_content_get(top<MemoSearchView>()->getEvasObj(), "contents");
 	const char *group = nullptr;
 	elm_layout_file_get(content, nullptr, &group);
@@ -133,8 +151,8 @@ TEST_F(SearchViewTest, noResultLayoutAndTheEditorKeepTheQuery)
 	EXPECT_NE(std::string::npos, std::string(elm_object_part_text_get(content, "elm.text")).find("No results found"));
 
 	for (int i = 0; i < 3; ++i)
-		pressKey("BackSpace");
-	typeText("planet");
+		pressed("BackSpace");
+	typed("planet");
 	tapCardIn(gridIn(top<MemoSearchView>()->getEvasObj()), 0);
 	MemoEditView *editor = nullptr;
 	ASSERT_TRUE(waitFor([&] { return (editor = top<MemoEditView>()) != nullptr; }));
