@@ -48,6 +48,12 @@ Evas_Object *MemoSearchView::__createSearchBar(Evas_Object *parent)
 
 	// So worded, though the button goes back.
 	Evas_Object *back = elm_button_add(bar);
+	// The default theme has a group of this style: the button takes the app's (the title bar's arrow) from a
+	// theme of its own that puts the app's file first.
+	Elm_Theme *theme = elm_theme_new();
+	elm_theme_overlay_add(theme, MemoUtil::getEdjePath());
+	elm_object_theme_set(back, theme);
+	elm_theme_free(theme);
 	elm_object_style_set(back, "naviframe/back_btn/default");
 	elm_object_text_set(back, "Next Page");
 	elm_object_part_content_set(bar, "prev_btn", back);

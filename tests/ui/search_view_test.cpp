@@ -71,6 +71,12 @@ TEST_F(SearchViewTest, eachKeyNarrowsBackSpaceWidensAndHiddenMemosStayOut)
 	addMemos();
 	openSearch();
 	EXPECT_EQ(6u, shown().size());
+	// The back button keeps its style's name and takes the app's look from the app's file.
+	const char *file = nullptr, *group = nullptr;
+	edje_object_file_get(elm_layout_edje_get(elm_object_part_content_get(titleContent("title"), "prev_btn")), &file,
+	                     &group);
+	EXPECT_NE(std::string::npos, std::string(file ? file : "").find("memo.edj"));
+	EXPECT_STREQ("elm/button/base/naviframe/back_btn/default", group);
 	// Newest first, as the search orders them.
 	const std::vector<std::vector<std::string>> steps = {{"Pick", "Plum", "Plan", "Planet"},
 	                                                     {"Plum", "Plan", "Planet"},
