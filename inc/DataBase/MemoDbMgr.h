@@ -19,10 +19,9 @@ struct MemoDbBusyInfo {
 };
 
 // The process's one door to "memo.db" in the app's data folder, which the sync service
-// shares. Main loop only, except getSearchReultN, which the search grid also runs on a worker
-// thread (the connection is serialised by SQLite; its other state is not touched). Every statement is formatted with
-// sqlite3_vmprintf and %q; nothing binds parameters, nothing opens a transaction, and a lock held by the other side is
-// waited for up to 100 retries of 100 ms.
+// shares. Main loop only. Every statement is formatted with sqlite3_vmprintf and %q;
+// nothing binds parameters, nothing opens a transaction, and a lock held by the other
+// side is waited for up to 100 retries of 100 ms.
 //
 // Failures come back as a false/null/-1 result with an error line; multi-statement
 // operations do not roll back. Arrays of strings returned through "N" operations are
@@ -69,8 +68,7 @@ public:
 	// UUIDs of the memos whose title or body holds text ("%", "_" and "/" act as LIKE
 	// wildcards/escape). Deleted and hidden rows are included: the caller filters.
 	bool getSearchReultN(const char *text, char ***uuids, int *count);
-	// Where the stored rows stand: equal stamps mean that no connection has written in between. Safe while a
-	// worker thread runs getSearchReultN on the connection (SQLite serialises them).
+	// Where the stored rows stand: equal stamps mean that no connection has written in between.
 	std::pair<long long, long long> getChangeStamp();
 
 	// ---- Writes ----

@@ -1,7 +1,6 @@
 #ifndef INC_LIST_MEMOGRIDCONTROL_H
 #define INC_LIST_MEMOGRIDCONTROL_H
 
-#include <functional>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -16,7 +15,6 @@
 class MemoGridItem;
 class MemoItemList;
 class MemoDocInfo;
-struct MemoGridSearchJob;
 
 // The memo grid: one elm_gengrid with a MemoGridItem per record. The owner's grid mode (see create) picks the
 // store read; the control sizes the cells for scale and orientation, keeps the scroll position across a
@@ -39,14 +37,6 @@ public:
 	// Rebuilds the grid with the matches of keyword among the current records, in the search's order, and
 	// writes their number to outCount.
 	void searchGrid(const char *keyword, int *outCount);
-	// As searchGrid, with the store's search on a worker thread: the grid changes when the result is back, and
-	// then done gets the keyword and the count on the main loop. Texts asked for while a search runs are not
-	// searched, except the latest one, after it; a result overtaken by a newer text is dropped. searchGrid
-	// drops what this has started.
-	void searchGridLater(const char *keyword);
-	void setSearchDoneCb(std::function<void(const char *keyword, int count)> done) { __searchDone = std::move(done); }
-	// True while a searchGridLater has not reached the grid yet.
-	bool isSearchPending() const { return __searchJob != nullptr; }
 	// Replaces the records with a fresh read of the visible memos, whatever the mode.
 	void reloadItems();
 	// The cards of the last update; the list cells are the control's, the cards the gengrid's.
@@ -88,14 +78,9 @@ private:
 	void __forgetCards();
 	static void __nearEndCb(void *data, Evas_Object *obj, void *eventInfo);
 	static void __resizedCb(void *data, Evas *evas, Evas_Object *obj, void *eventInfo);
-	// MemoGridSearchQuery.cpp: the query on a worker and what may spare it.
+	// MemoGridSearchQuery.cpp: what may spare the store's search.
 	bool __searchCannotMatch(const char *keyword);
 	void __keepSearch(const char *keyword, int count, bool ok, std::pair<long long, long long> stamp);
-	void __startSearchJob(const char *keyword);
-	void __onSearchJobEnd(MemoGridSearchJob *job);
-	void __dropSearchJob(bool wait);
-	static void __searchJobCb(void *data, Ecore_Thread *thread);
-	static void __searchJobEndCb(void *data, Ecore_Thread *thread);
 	int __getItemType(MemoDocInfo *record);
 	static void __scrollCb(void *data, Evas_Object *obj, void *eventInfo);
 	static void __pressedItemCb(void *data, Evas_Object *obj, void *eventInfo);
@@ -122,16 +107,13 @@ private:
 	bool __watchingEnd = false;
 	// The row of each UUID of __itemList, made on the first search over it.
 	std::unordered_map<std::string_view, int> __rowOfUuid;
-	// The query running on a worker, a newer text waiting for it, and the last result the store gave.
-	MemoGridSearchJob *__searchJob = nullptr;
-	bool __hasQueuedKeyword = false;
-	std::string __queuedKeyword;
-	std::function<void(const char *, int)> __searchDone;
+	// The last result the store gave, with where the store and the language stood then.
 	struct {
 		bool valid = false;
 		std::string text;
 		int count = 0;
 		std::pair<long long, long long> stamp;
+		std::string header;
 	} __lastSearch;
 
 	// Shared by every grid of the process: a new grid forgets the position of the others.

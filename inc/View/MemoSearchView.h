@@ -20,9 +20,6 @@ public:
 	MemoSearchView();
 	~MemoSearchView() override;
 	const char *getClassName() const override;
-	// True while a text typed into the field has not reached the grid yet (the store's search runs on a
-	// worker).
-	bool isSearchPending() const;
 
 protected:
 	// viewParam: null, or the address of an app_control_h whose operation may be a pick. Logs "parent object
@@ -48,8 +45,6 @@ private:
 
 	// MemoSearchView.cpp
 	void __search(const char *text);
-	// Steps after a search: the grid or the no-result layout in "contents", the text kept.
-	void __showResult(const char *text, int count);
 	void __onGridSelected(MemoGridItem *item);
 	void __pushEditView(MemoDocInfo *record);
 	void __sendPickResult(MemoGridItem *item);

@@ -80,7 +80,6 @@ Evas_Object *MemoGridControl::onCreateView(Evas_Object *parent, void *param)
 
 void MemoGridControl::onDestroy()
 {
-	__dropSearchJob(true);
 	__forgetCards();
 	free(__checkStates);
 	__checkStates = nullptr;

@@ -28,8 +28,6 @@ void MemoGridControl::searchGrid(const char *keyword, int *outCount)
 		MEMO_LOGE("gengrid obj is NULL");
 		return;
 	}
-	// This search is the newest: one started by searchGridLater is no longer wanted.
-	__dropSearchJob(false);
 	__setGridSize(gengrid);
 	char **uuids = nullptr;
 	int count = 0;

@@ -41,8 +41,6 @@ MemoSearchView::~MemoSearchView()
 	free(__lastEntryText);
 	free(__searchText);
 	delete __openedRecord;
-	if (!__gridRef.expired())
-		__grid->setSearchDoneCb(nullptr);
 	if (__resultCount == 0 && !__gridRef.expired() && __grid->getEvasObj())
 		__grid->destroy();
 }
@@ -83,7 +81,6 @@ Evas_Object *MemoSearchView::onCreateView(Evas_Object *parent, void *viewParam)
 	}
 	__gridRef = __grid->getWeakPtr();
 	__grid->updateGrid();
-	__grid->setSearchDoneCb([this](const char *text, int count) { __showResult(text, count); });
 	__grid->getSelectedSignal().addListener([this](const char *, MemoGridItem *item) { __onGridSelected(item); },
 	                                        __layout);
 	__emitOrientationSignal();
@@ -133,20 +130,10 @@ void MemoSearchView::onBecomeTop()
 	    nullptr, getEvasObj());
 }
 
-bool MemoSearchView::isSearchPending() const
-{
-	return __grid && !__gridRef.expired() && __grid->isSearchPending();
-}
-
 void MemoSearchView::__search(const char *text)
 {
 	int count = 0;
 	__grid->searchGrid(text, &count);
-	__showResult(text, count);
-}
-
-void MemoSearchView::__showResult(const char *text, int count)
-{
 	__resultCount = count;
 	Evas_Object *gridObj = __grid->getEvasObj();
 	elm_object_part_content_set(__layout, "contents", gridObj);
@@ -225,8 +212,7 @@ void MemoSearchView::__broadCasterCb(const char *key, void *data)
 			    return false;
 		    },
 		    nullptr, getEvasObj());
-		// A search still on its way counts as done: its text is the one to show.
-		char *text = strdup(isSearchPending() && __lastEntryText ? __lastEntryText : __searchText);
+		char *text = strdup(__searchText);
 		__search(text);
 		free(text);
 	} else if (!strcmp(key, "broadcast,sync,listupdate")) {

@@ -10,7 +10,6 @@
 #include <uxt_edit_field.h>
 #include <uxt_theme.h>
 
-#include "List/MemoGridControl.h"
 #include "MemoLog.h"
 #include "Util/MemoUtil.h"
 
@@ -94,8 +93,7 @@ void MemoSearchView::__entryChangedCb(void *data, Evas_Object *obj, void *eventI
 	free(self->__lastEntryText);
 	self->__lastEntryText = strdup(text ? text : "");
 	free(text);
-	// The store's search runs on a worker; the grid and the no-result layout follow when it is back.
-	self->__grid->searchGridLater(self->__lastEntryText);
+	self->__search(self->__lastEntryText);
 }
 
 void MemoSearchView::__entryActivatedCb(void *data, Evas_Object *obj, void *eventInfo)

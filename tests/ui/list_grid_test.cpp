@@ -187,8 +187,8 @@ TEST_F(GridTest, keywordsAreHighlightedOutsideTags)
 }
 
 // The search grid makes cards for the first matches and the rest as the view nears them; a key that keeps a
-// match keeps its card and changes its highlight in place (texts and check lines); the worker's search ends
-// as the direct one, and a text that held a no-result text is searched again once the store has changed.
+// match keeps its card and changes its highlight in place (texts and check lines); a text that holds a
+// no-result text is not searched, with the store's own result, until the store has changed.
 TEST_F(GridTest, searchCardsComeAsNeededStayAcrossKeysAndFollowTheStore)
 {
 	for (int i = 0; i < 70; ++i)
@@ -206,12 +206,8 @@ TEST_F(GridTest, searchCardsComeAsNeededStayAcrossKeysAndFollowTheStore)
 	ASSERT_EQ(week, card->getDocInfo()->getMemoUUID());
 	EXPECT_NE(std::string::npos, labelIn(cardContent(cardAt(0), "check_swallow_line_two")).find(">br</color>"));
 
-	std::vector<std::pair<std::string, int>> done;
-	grid->setSearchDoneCb([&](const char *text, int n) { done.emplace_back(text, n); });
-	grid->searchGridLater("bre");
-	EXPECT_TRUE(grid->isSearchPending());
-	ASSERT_TRUE(waitFor([&] { return !done.empty(); }));
-	EXPECT_EQ((std::pair<std::string, int>("bre", 71)), done.back());
+	grid->searchGrid("bre", &count);
+	EXPECT_EQ(71, count);
 	EXPECT_EQ(card, elm_object_item_data_get(cardAt(0)));
 	EXPECT_NE(std::string::npos, cardText(cardAt(0), "title").find("Week"));
 	EXPECT_NE(std::string::npos, labelIn(cardContent(cardAt(0), "check_swallow_line_two")).find(">bre</color>"));
@@ -234,11 +230,13 @@ TEST_F(GridTest, searchCardsComeAsNeededStayAcrossKeysAndFollowTheStore)
 	// "qq" matches nothing; "qqz" would match nothing either, until a memo holding it is stored.
 	grid->searchGrid("qq", &count);
 	EXPECT_EQ(0, count);
+	grid->searchGrid("qqz", &count);
+	EXPECT_EQ(0, count);
+	EXPECT_EQ(0u, elm_gengrid_items_count(gengrid));
 	addMemo(TestMemo("qqz", "x"));
 	grid->reloadItems();
-	grid->searchGridLater("qqz");
-	ASSERT_TRUE(waitFor([&] { return done.back().first == "qqz"; }));
-	EXPECT_EQ(1, done.back().second);
+	grid->searchGrid("qqz", &count);
+	EXPECT_EQ(1, count);
 	EXPECT_EQ(1u, elm_gengrid_items_count(gengrid));
 }
 

@@ -29,24 +29,6 @@ protected:
 		ASSERT_NE(nullptr, top<MemoSearchView>());
 		focus(entry());
 	}
-	// Keys into the field, then the wait for the store's search, which runs on a worker.
-	void typed(const char *text)
-	{
-		typeText(text);
-		settle();
-	}
-	void pressed(const char *key)
-	{
-		pressKey(key);
-		settle();
-	}
-	void settle()
-	{
-		waitFor([&] {
-			MemoSearchView *view = top<MemoSearchView>();
-			return !view || !view->isSearchPending();
-		});
-	}
 	Evas_Object *entry() { return elm_object_part_content_get(titleContent("title"), "elm.swallow.searchbar"); }
 	std::vector<std::string> shown() { return titlesIn(gridIn(top<MemoSearchView>()->getEvasObj())); }
 	// The text of part of the first result's card, after a render.
@@ -85,15 +67,15 @@ TEST_F(SearchViewTest, eachKeyNarrowsBackSpaceWidensAndHiddenMemosStayOut)
 	                                                     {"Planet"}};
 	const char *keys = "plane";
 	for (size_t i = 0; i < steps.size(); ++i) {
-		typed(std::string(1, keys[i]).c_str());
+		typeText(std::string(1, keys[i]).c_str());
 		EXPECT_EQ(steps[i], shown()) << "after " << i + 1 << " keys";
 	}
 	for (int i = 3; i >= 0; --i) {
-		pressed("BackSpace");
+		pressKey("BackSpace");
 		EXPECT_EQ(steps[i], shown()) << "after BackSpace to " << i + 1 << " keys";
 	}
 	// Emptied, the field lists every visible memo again.
-	pressed("BackSpace");
+	pressKey("BackSpace");
 	EXPECT_EQ(6u, shown().size());
 
 	// From the hidden view (grid mode 5) the hidden memo is a result too.
@@ -102,7 +84,7 @@ TEST_F(SearchViewTest, eachKeyNarrowsBackSpaceWidensAndHiddenMemosStayOut)
 	ASSERT_TRUE(naviframe()->push(hiddenSearch));
 	runFor(0.5);
 	focus(entry());
-	typed("plane");
+	typeText("plane");
 	EXPECT_EQ((std::vector<std::string>{"Planetarium", "Planet"}), shown());
 }
 
@@ -113,7 +95,7 @@ TEST_F(SearchViewTest, matchesAreHighlightedAndWildcardsActAsTheStatementSays)
 	addMemo(TestMemo("Other", "nothing here"));
 	openSearch();
 
-	typed("AB");
+	typeText("AB");
 	ASSERT_EQ((std::vector<std::string>{"cab Abby bread"}), shown());
 	const std::string title = cardPart("title"), body = cardPart("text");
 	const std::string mark = tagBefore(title, "ab");
@@ -125,22 +107,22 @@ TEST_F(SearchViewTest, matchesAreHighlightedAndWildcardsActAsTheStatementSays)
 	EXPECT_NE(std::string::npos, body.find("<br/>")) << body;
 
 	// In the body a match would fall inside the line break only: it stays whole and unmarked.
-	pressed("BackSpace");
-	pressed("BackSpace");
-	typed("br");
+	pressKey("BackSpace");
+	pressKey("BackSpace");
+	typeText("br");
 	EXPECT_EQ(std::string::npos, cardPart("text").find(mark)) << cardPart("text");
 	EXPECT_NE(std::string::npos, cardPart("text").find("<br/>"));
 
 	// "%" and "_" are wildcards of the pattern; a quote is doubled and matches itself.
-	pressed("BackSpace");
-	pressed("BackSpace");
-	typed("%");
+	pressKey("BackSpace");
+	pressKey("BackSpace");
+	typeText("%");
 	EXPECT_EQ(3u, shown().size());
-	pressed("BackSpace");
-	typed("_");
+	pressKey("BackSpace");
+	typeText("_");
 	EXPECT_EQ(3u, shown().size());
-	pressed("BackSpace");
-	typed("'");
+	pressKey("BackSpace");
+	typeText("'");
 	EXPECT_EQ((std::vector<std::string>{"Tom's list"}), shown());
 }
 
@@ -148,7 +130,7 @@ TEST_F(SearchViewTest, noResultLayoutAndTheEditorKeepTheQuery)
 {
 	addMemos();
 	openSearch();
-	typed("qqq");
+	typeText("qqq");
 	Evas_Object *content = elm_object_part_content_get(top<MemoSearchView>()->getEvasObj(), "contents");
 	const char *group = nullptr;
 	elm_layout_file_get(content, nullptr, &group);
@@ -157,8 +139,8 @@ TEST_F(SearchViewTest, noResultLayoutAndTheEditorKeepTheQuery)
 	EXPECT_NE(std::string::npos, std::string(elm_object_part_text_get(content, "elm.text")).find("No results found"));
 
 	for (int i = 0; i < 3; ++i)
-		pressed("BackSpace");
-	typed("planet");
+		pressKey("BackSpace");
+	typeText("planet");
 	tapCardIn(gridIn(top<MemoSearchView>()->getEvasObj()), 0);
 	MemoEditView *editor = nullptr;
 	ASSERT_TRUE(waitFor([&] { return (editor = top<MemoEditView>()) != nullptr; }));
