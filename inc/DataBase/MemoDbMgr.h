@@ -1,6 +1,8 @@
 #ifndef INC_DATABASE_MEMODBMGR_H
 #define INC_DATABASE_MEMODBMGR_H
 
+#include <utility>
+
 // SQLite stays out of this header: callers see only the opaque types.
 struct sqlite3;
 struct sqlite3_stmt;
@@ -66,6 +68,8 @@ public:
 	// UUIDs of the memos whose title or body holds text ("%", "_" and "/" act as LIKE
 	// wildcards/escape). Deleted and hidden rows are included: the caller filters.
 	bool getSearchReultN(const char *text, char ***uuids, int *count);
+	// Where the stored rows stand: equal stamps mean that no connection has written in between.
+	std::pair<long long, long long> getChangeStamp();
 
 	// ---- Writes ----
 

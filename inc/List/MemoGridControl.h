@@ -1,11 +1,14 @@
 #ifndef INC_LIST_MEMOGRIDCONTROL_H
 #define INC_LIST_MEMOGRIDCONTROL_H
 
+#include <memory>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include <Elementary.h>
-
-#include <memory>
 
 #include <WSignal.h>
 #include <WViewController.h>
@@ -59,11 +62,27 @@ public:
 
 private:
 	void __setGridSize(Evas_Object *gengrid);
-	void __appendItem(MemoDocInfo *record, int row, const char *keyword);
-	// MemoGridControlSearch.cpp: turns the search grid's cards into those of `records` by deleting the others
-	// and giving the rest the keyword; false (nothing changed) when a card of records is missing or the
-	// order differs.
-	bool __reconcileSearchItems(const std::vector<MemoDocInfo *> &records, const char *keyword);
+	// The card made, or null.
+	MemoGridItem *__appendItem(MemoDocInfo *record, int row, const char *keyword, Elm_Object_Item *before = nullptr);
+	// A card on the gengrid, with the row of __itemList that it shows.
+	struct Card {
+		int row;
+		MemoGridItem *item;
+		Elm_Object_Item *objectItem;
+	};
+	// MemoGridControlSearch.cpp: the rows of the store's result (the UUIDs are freed), the cards they need, and
+	// the cards that come as the view nears the end of those made.
+	std::vector<int> __rowsOfResult(char **uuids, int count, int listRows);
+	void __showRows(std::vector<int> rows, const char *keyword, int listRows);
+	void __fillLazily(int rows);
+	size_t __cardsPerLoad();
+	void __loadMoreCards();
+	void __forgetCards();
+	static void __nearEndCb(void *data, Evas_Object *obj, void *eventInfo);
+	static void __resizedCb(void *data, Evas *evas, Evas_Object *obj, void *eventInfo);
+	// MemoGridSearchQuery.cpp: what may spare the store's search.
+	bool __searchCannotMatch(const char *keyword);
+	void __keepSearch(const char *keyword, int count, bool ok, std::pair<long long, long long> stamp);
 	int __getItemType(MemoDocInfo *record);
 	// The quick memo's header and guide, written into the in-memory record before its item is built.
 	void __prepareRecord(MemoDocInfo *record);
@@ -85,8 +104,26 @@ private:
 	bool __scrolledInPortrait;
 	bool __scrolledInLandscape;
 	int __scrollEventCount;
-	// The gengrid holds the cards of a search (each with the keyword), not those of a full update.
-	bool __searchShown = false;
+	// The rows that the grid shows, in order: a search's matches (cards with the keyword) or the rows of a full
+	// update (cards with their row). __cards are the gengrid's cards, for the first of them; in the search
+	// modes the others come as the view nears the end (a gengrid's every change costs in proportion to its
+	// cards, so it holds few of them).
+	std::vector<int> __targetRows;
+	// The gengrid holds a search's cards (each with the keyword): a reload never rebinds them.
+	bool __targetSearch = false;
+	std::string __targetKeyword;
+	std::vector<Card> __cards;
+	bool __watchingEnd = false;
+	// The row of each UUID of __itemList, made on the first search over it.
+	std::unordered_map<std::string_view, int> __rowOfUuid;
+	// The last result the store gave, with where the store and the language stood then.
+	struct {
+		bool valid = false;
+		std::string text;
+		int count = 0;
+		std::pair<long long, long long> stamp;
+		std::string header;
+	} __lastSearch;
 	// What the items were last built from: the rows (kept while the items stand), the view kind, the orientation.
 	std::shared_ptr<const MemoTextArena> __itemsFrom;
 	int __itemsKind;

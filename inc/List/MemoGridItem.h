@@ -35,6 +35,9 @@ public:
 	void rebind(MemoDocInfo *docInfo, int row, int *checkStates);
 	// The search text to highlight (copied; null or empty for none) and the gengrid whose colours it takes.
 	void setKeyword(const char *keyword, Evas_Object *grid);
+	// A realized card shows the keyword set since it was drawn: its texts and the texts of its check lines
+	// change in place, as drawing it again would leave them.
+	void refreshHighlight();
 
 	// The record; logs "__docInfo is NULL" when there is none.
 	MemoDocInfo *getDocInfo();
@@ -65,6 +68,8 @@ private:
 	Evas_Object *__createCheckPart(Evas_Object *grid, const char *part);
 	Evas_Object *__createCountGroup(Evas_Object *grid, const char *group, int lineLimit);
 	Evas_Object *__createSingleLine(Evas_Object *grid, int index);
+	void __setLineTexts(Evas_Object *layout, Evas_Object *grid, int lineLimit);
+	static std::string __singleLineText(int kind, const std::string &markup);
 	// The preview lines of the display content, parsed on first use.
 	const std::vector<MemoGridLine> &__getLines();
 	std::string __lineMarkup(Evas_Object *grid, const MemoGridLine &line);

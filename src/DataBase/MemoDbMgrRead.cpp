@@ -354,3 +354,15 @@ bool MemoDbMgr::getSearchReultN(const char *text, char ***uuids, int *count)
 	*uuids = array;
 	return true;
 }
+
+std::pair<long long, long long> MemoDbMgr::getChangeStamp()
+{
+	// data_version moves with the commits of other connections, the change count with this one's.
+	long long version = -1;
+	sqlite3_stmt *stmt = nullptr;
+	if (__handle && sqlite3_prepare_v2(__handle, "PRAGMA data_version", -1, &stmt, nullptr) == SQLITE_OK &&
+	    sqlite3_step(stmt) == SQLITE_ROW)
+		version = sqlite3_column_int64(stmt, 0);
+	sqlite3_finalize(stmt);
+	return {version, __handle ? sqlite3_total_changes64(__handle) : -1};
+}

@@ -80,6 +80,7 @@ Evas_Object *MemoGridControl::onCreateView(Evas_Object *parent, void *param)
 
 void MemoGridControl::onDestroy()
 {
+	__forgetCards();
 	free(__checkStates);
 	__checkStates = nullptr;
 	delete __itemList;
@@ -122,6 +123,7 @@ void MemoGridControl::updateGrid(bool keepList)
 		__itemCount = __itemList->getCount();
 		free(__checkStates);
 		__checkStates = static_cast<int *>(calloc(static_cast<size_t>(__itemCount) + 1, sizeof(int)));
+		__rowOfUuid.clear();
 	} else {
 		__itemCount = __itemList ? __itemList->getCount() : 0;
 	}
@@ -129,9 +131,15 @@ void MemoGridControl::updateGrid(bool keepList)
 		return;
 	eina_list_free(previous);
 	elm_gengrid_clear(gengrid);
-	__searchShown = false;
-	for (int row = 0; row < __itemCount; ++row)
-		__appendItem(__itemList->getItem(row), row, nullptr);
+	__fillLazily(__itemCount);
+	// The search modes take their cards as the view nears them; the others make them all.
+	if (!__gridMode || (*__gridMode != 0 && *__gridMode != 5)) {
+		for (size_t row = __cards.size(); row < __targetRows.size(); ++row) {
+			MemoGridItem *item =
+			    __appendItem(__itemList->getItem(static_cast<int>(row)), static_cast<int>(row), nullptr);
+			__cards.push_back({static_cast<int>(row), item, item ? item->getElmObjectItem() : nullptr});
+		}
+	}
 	__noteItemsBuilt();
 }
 
@@ -140,8 +148,9 @@ void MemoGridControl::reloadItems()
 	// The cards point into the records that go here; a search that finds no row would keep them.
 	if (getEvasObj())
 		elm_gengrid_clear(getEvasObj());
-	__searchShown = false;
 	__itemsFrom.reset();
+	__forgetCards();
+	__rowOfUuid.clear();
 	delete __itemList;
 	__itemList = MemoDbMgr::getInstance()->getVisibleMemoListN();
 }
@@ -151,10 +160,10 @@ Eina_List *MemoGridControl::getGridItems()
 	return __gridItems;
 }
 
-void MemoGridControl::__appendItem(MemoDocInfo *record, int row, const char *keyword)
+MemoGridItem *MemoGridControl::__appendItem(MemoDocInfo *record, int row, const char *keyword, Elm_Object_Item *before)
 {
 	if (!record)
-		return;
+		return nullptr;
 	__prepareRecord(record);
 	MemoGridItem *item = new MemoGridItem(__getItemType(record), record);
 	item->setViewKind(__gridMode ? *__gridMode : -1);
@@ -163,15 +172,18 @@ void MemoGridControl::__appendItem(MemoDocInfo *record, int row, const char *key
 	else
 		item->setRow(row, __checkStates);
 	Elm_Gengrid_Item_Class *itemClass = item->getItemClassNew();
-	Elm_Object_Item *objectItem = elm_gengrid_item_append(getEvasObj(), itemClass, item, __pressedItemCb, this);
+	Elm_Object_Item *objectItem =
+	    before ? elm_gengrid_item_insert_before(getEvasObj(), itemClass, item, before, __pressedItemCb, this)
+	           : elm_gengrid_item_append(getEvasObj(), itemClass, item, __pressedItemCb, this);
 	elm_gengrid_item_class_free(itemClass);
 	if (!objectItem) {
 		MEMO_LOGE("elm_gengrid_item_append() is failed");
 		delete item;
-		return;
+		return nullptr;
 	}
 	item->setElmObjectItem(objectItem);
 	__gridItems = eina_list_append(__gridItems, item);
+	return item;
 }
 
 void MemoGridControl::__prepareRecord(MemoDocInfo *record)

@@ -22,15 +22,20 @@ bool MemoGridControl::__rebindItems(Eina_List *items)
 {
 	// Equal rows give equal records, layout codes and texts; the view kind and the orientation choose the
 	// item class; a rebuilt grid starts at the top. The cards are taken from the gengrid itself: a search
-	// may have deleted some since.
+	// may have deleted some since, and a search's cards (__targetSearch) are left to a rebuild. In the search
+	// modes, whose cards come as the view nears them, only a grid holding every card is rebound.
 	Evas_Object *gengrid = getEvasObj();
 	Evas_Coord x = 0, y = 0;
 	elm_scroller_region_get(gengrid, &x, &y, nullptr, nullptr);
-	if (__itemCount <= 0 || !__itemsFrom || __searchShown || __itemList->getItem(0)->getTexts() != __itemsFrom ||
+	if (__itemCount <= 0 || !__itemsFrom || __targetSearch || __itemList->getItem(0)->getTexts() != __itemsFrom ||
 	    __itemsKind != (__gridMode ? *__gridMode : -1) || __itemsPortrait != gIsPortrait || x || y ||
 	    static_cast<int>(elm_gengrid_items_count(gengrid)) != __itemCount)
 		return false;
 	eina_list_free(items);
+	// Every row keeps its card: the rows to show and the cards made are all of them, in order.
+	__cards.clear();
+	__cards.reserve(static_cast<size_t>(__itemCount));
+	__targetRows.resize(static_cast<size_t>(__itemCount));
 	int row = 0;
 	for (Elm_Object_Item *it = elm_gengrid_first_item_get(gengrid); it; it = elm_gengrid_item_next_get(it), ++row) {
 		MemoGridItem *card = static_cast<MemoGridItem *>(elm_object_item_data_get(it));
@@ -38,6 +43,8 @@ bool MemoGridControl::__rebindItems(Eina_List *items)
 		__prepareRecord(record);
 		card->rebind(record, row, __checkStates);
 		__gridItems = eina_list_append(__gridItems, card);
+		__targetRows[static_cast<size_t>(row)] = row;
+		__cards.push_back({row, card, it});
 	}
 	elm_gengrid_realized_items_update(gengrid);
 	return true;

@@ -1,6 +1,7 @@
 // The check lines of a card: one layout per line count, or single lines of an image and a label each.
 #include "List/MemoGridItem.h"
 
+#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -16,6 +17,10 @@ const int CHECK_IMAGE_SIZE = 31;
 const int TABLE_PADDING = 10;
 const int PLAIN_LABEL_HEIGHT = 43;
 const int CHECK_LABEL_HEIGHT = 47;
+// What a check line object keeps of how it was made (evas object data).
+const char LINE_LIMIT_KEY[] = "memo.lines";
+const char LINE_LABEL_KEY[] = "memo.label";
+const char LINE_INDEX_KEY[] = "memo.line";
 
 const char PLAIN_STYLE[] = "<font_size=32 color=#000000 font=Font2:style=Regular align=left color_class=ATO004 "
                            "text_class=ATO004>%s</font_size>";
@@ -129,19 +134,61 @@ Evas_Object *MemoGridItem::__createCountGroup(Evas_Object *grid, const char *gro
 	const std::vector<MemoGridLine> &lines = __getLines();
 	for (int i = 0; i < lineLimit && i < static_cast<int>(lines.size()); ++i) {
 		const LineParts &parts = lineLimit == 1 ? ONE_LINE_GROUP : COUNT_GROUP_LINES[i];
-		const MemoGridLine &line = lines[static_cast<size_t>(i)];
-		const std::string text = __lineMarkup(grid, line);
-		if (line.kind == MEMO_GRID_LINE_PLAIN) {
-			elm_object_part_text_set(layout, parts.plain, text.c_str());
-		} else if (line.kind == MEMO_GRID_LINE_UNTICKED) {
+		const int kind = lines[static_cast<size_t>(i)].kind;
+		if (kind == MEMO_GRID_LINE_UNTICKED)
 			elm_object_part_content_set(layout, parts.image, __strokeImage(layout, "AO003L1"));
-			elm_object_part_text_set(layout, parts.text, text.c_str());
-		} else {
+		else if (kind != MEMO_GRID_LINE_PLAIN)
 			elm_object_part_content_set(layout, parts.image, __tickImage(layout));
-			elm_object_part_text_set(layout, parts.struck, text.c_str());
-		}
 	}
+	__setLineTexts(layout, grid, lineLimit);
+	evas_object_data_set(layout, LINE_LIMIT_KEY, reinterpret_cast<void *>(static_cast<intptr_t>(lineLimit)));
 	return layout;
+}
+
+void MemoGridItem::__setLineTexts(Evas_Object *layout, Evas_Object *grid, int lineLimit)
+{
+	const std::vector<MemoGridLine> &lines = __getLines();
+	for (int i = 0; i < lineLimit && i < static_cast<int>(lines.size()); ++i) {
+		const LineParts &parts = lineLimit == 1 ? ONE_LINE_GROUP : COUNT_GROUP_LINES[i];
+		const MemoGridLine &line = lines[static_cast<size_t>(i)];
+		const char *part = line.kind == MEMO_GRID_LINE_PLAIN      ? parts.plain
+		                   : line.kind == MEMO_GRID_LINE_UNTICKED ? parts.text
+		                                                          : parts.struck;
+		elm_object_part_text_set(layout, part, __lineMarkup(grid, line).c_str());
+	}
+}
+
+std::string MemoGridItem::__singleLineText(int kind, const std::string &markup)
+{
+	if (kind == MEMO_GRID_LINE_PLAIN)
+		return __styled(PLAIN_STYLE, markup);
+	return __styled(kind == MEMO_GRID_LINE_UNTICKED ? UNTICKED_STYLE : TICKED_STYLE, markup);
+}
+
+// The check line objects keep what they were made of (the line limit of a count group, the index and the
+// label of a single line), so that a new keyword changes their texts alone.
+void MemoGridItem::refreshHighlight()
+{
+	Elm_Object_Item *item = getElmObjectItem();
+	if (!item)
+		return;
+	elm_gengrid_item_fields_update(item, "*", ELM_GENGRID_ITEM_FIELD_TEXT);
+	Evas_Object *grid = elm_object_item_widget_get(item);
+	Evas_Object *group = elm_object_item_part_content_get(item, "one_checklist_swallow");
+	if (group && evas_object_data_get(group, LINE_LIMIT_KEY))
+		__setLineTexts(group, grid,
+		               static_cast<int>(reinterpret_cast<intptr_t>(evas_object_data_get(group, LINE_LIMIT_KEY))));
+	const std::vector<MemoGridLine> &lines = __getLines();
+	for (const char *part : {"check_swallow_line_one", "check_swallow_line_two", "check_swallow_line_three"}) {
+		Evas_Object *table = elm_object_item_part_content_get(item, part);
+		Evas_Object *label = table ? static_cast<Evas_Object *>(evas_object_data_get(table, LINE_LABEL_KEY)) : nullptr;
+		const int index =
+		    table ? static_cast<int>(reinterpret_cast<intptr_t>(evas_object_data_get(table, LINE_INDEX_KEY))) : -1;
+		if (!label || index < 0 || index >= static_cast<int>(lines.size()))
+			continue;
+		const MemoGridLine &line = lines[static_cast<size_t>(index)];
+		elm_object_text_set(label, __singleLineText(line.kind, __lineMarkup(grid, line)).c_str());
+	}
 }
 
 Evas_Object *MemoGridItem::__createSingleLine(Evas_Object *grid, int index)
@@ -174,12 +221,14 @@ Evas_Object *MemoGridItem::__createSingleLine(Evas_Object *grid, int index)
 	evas_object_color_set(cell, 0, 0, 0, 0);
 	const std::string markup = __lineMarkup(grid, line);
 	int width = __labelWidth, height = CHECK_LABEL_HEIGHT;
+	elm_object_text_set(label, __singleLineText(line.kind, markup).c_str());
+	evas_object_data_set(table, LINE_LABEL_KEY, label);
+	evas_object_data_set(table, LINE_INDEX_KEY, reinterpret_cast<void *>(static_cast<intptr_t>(index)));
 	if (line.kind == MEMO_GRID_LINE_PLAIN) {
 		char signal[32];
 		snprintf(signal, sizeof(signal), "text,enable,%d", index + 1);
 		if (item)
 			elm_object_item_signal_emit(item, signal, "elm");
-		elm_object_text_set(label, __styled(PLAIN_STYLE, markup).c_str());
 		width = __titleWidth;
 		height = PLAIN_LABEL_HEIGHT;
 		elm_table_pack(table, cell, 0, 0, 1, 1);
@@ -188,10 +237,8 @@ Evas_Object *MemoGridItem::__createSingleLine(Evas_Object *grid, int index)
 		if (line.kind == MEMO_GRID_LINE_UNTICKED) {
 			elm_table_pack(table, __strokeImage(table, "AO003L1"), 0, 0, 1, 1);
 			elm_table_pack(table, __strokeImage(table, "AO003"), 0, 0, 1, 1);
-			elm_object_text_set(label, __styled(UNTICKED_STYLE, markup).c_str());
 		} else {
 			elm_table_pack(table, __tickImage(table), 0, 0, 1, 1);
-			elm_object_text_set(label, __styled(TICKED_STYLE, markup).c_str());
 		}
 		elm_table_pack(table, cell, 1, 0, 1, 1);
 		elm_table_pack(table, label, 1, 0, 1, 1);

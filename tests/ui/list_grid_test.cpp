@@ -186,6 +186,60 @@ TEST_F(GridTest, keywordsAreHighlightedOutsideTags)
 	EXPECT_NE(std::string::npos, cardText(card, "text").find(">lake</color>"));
 }
 
+// The search grid makes cards for the first matches and the rest as the view nears them; a key that keeps a
+// match keeps its card and changes its highlight in place (texts and check lines); a text that holds a
+// no-result text is not searched, with the store's own result, until the store has changed.
+TEST_F(GridTest, searchCardsComeAsNeededStayAcrossKeysAndFollowTheStore)
+{
+	for (int i = 0; i < 70; ++i)
+		addMemo(TestMemo("bread " + std::to_string(i), "text"));
+	const std::string week = addMemo(TestMemo("Week", checkLines({"+brew", "-bread", "-tea", "-jam"})));
+	resizeWindow(480, 800);
+	int mode = 0;
+	makeGrid(&mode);
+	Evas_Object *gengrid = grid->getEvasObj();
+	int count = -1;
+	grid->searchGrid("br", &count);
+	EXPECT_EQ(71, count);
+	EXPECT_LT(elm_gengrid_items_count(gengrid), 71u);
+	MemoGridItem *card = static_cast<MemoGridItem *>(elm_object_item_data_get(cardAt(0)));
+	ASSERT_EQ(week, card->getDocInfo()->getMemoUUID());
+	EXPECT_NE(std::string::npos, labelIn(cardContent(cardAt(0), "check_swallow_line_two")).find(">br</color>"));
+
+	grid->searchGrid("bre", &count);
+	EXPECT_EQ(71, count);
+	EXPECT_EQ(card, elm_object_item_data_get(cardAt(0)));
+	EXPECT_NE(std::string::npos, cardText(cardAt(0), "title").find("Week"));
+	EXPECT_NE(std::string::npos, labelIn(cardContent(cardAt(0), "check_swallow_line_two")).find(">bre</color>"));
+
+	Evas_Coord w = 0, h = 0;
+	for (int i = 0; i < 40 && elm_gengrid_items_count(gengrid) < 71; ++i) {
+		elm_scroller_region_get(gengrid, nullptr, nullptr, &w, &h);
+		elm_scroller_region_show(gengrid, 0, 1000000, w, h);
+		render();
+	}
+	EXPECT_EQ(71u, elm_gengrid_items_count(gengrid));
+
+	// "a/" ends in an escape and matches nothing; "a/b" is no longer its part and does match.
+	addMemo(TestMemo("cab", "x"));
+	grid->reloadItems();
+	grid->searchGrid("a/", &count);
+	EXPECT_EQ(0, count);
+	grid->searchGrid("a/b", &count);
+	EXPECT_EQ(1, count);
+	// "qq" matches nothing; "qqz" would match nothing either, until a memo holding it is stored.
+	grid->searchGrid("qq", &count);
+	EXPECT_EQ(0, count);
+	grid->searchGrid("qqz", &count);
+	EXPECT_EQ(0, count);
+	EXPECT_EQ(0u, elm_gengrid_items_count(gengrid));
+	addMemo(TestMemo("qqz", "x"));
+	grid->reloadItems();
+	grid->searchGrid("qqz", &count);
+	EXPECT_EQ(1, count);
+	EXPECT_EQ(1u, elm_gengrid_items_count(gengrid));
+}
+
 TEST_F(GridTest, eachGridModeReadsItsRows)
 {
 	MemoItemList *list = MemoDbMgr::getInstance()->getVisibleMemoListN();
@@ -218,6 +272,17 @@ TEST_F(GridTest, eachGridModeReadsItsRows)
 	Elm_Object_Item *first = elm_gengrid_first_item_get(grid->getEvasObj());
 	grid->updateGrid();
 	EXPECT_EQ(first, elm_gengrid_first_item_get(grid->getEvasObj()));
+	EXPECT_EQ(visible, shown());
+	// A search over the rebound cards keeps the card of a match and leaves no other; a reload after it builds
+	// the cards again.
+	Elm_Object_Item *second = elm_gengrid_item_next_get(first);
+	int count = -1;
+	grid->searchGrid("Normal", &count);
+	EXPECT_EQ(1, count);
+	EXPECT_EQ(1u, elm_gengrid_items_count(grid->getEvasObj()));
+	EXPECT_EQ(second, elm_gengrid_first_item_get(grid->getEvasObj()));
+	grid->updateGrid();
+	EXPECT_EQ(2u, elm_gengrid_items_count(grid->getEvasObj()));
 	EXPECT_EQ(visible, shown());
 }
 
