@@ -31,6 +31,7 @@
 #include "View/MemoEditView.h"
 
 #include "BenchEnv.h"
+#include "LoopIterations.h"
 
 using namespace memo_bench;
 
@@ -41,13 +42,6 @@ const int PICTURES = 10;
 // A picture as the editor keeps it after shrinking: 320,000 pixels at most.
 const int PICTURE_W = 640, PICTURE_H = 480;
 const double WATCH_SEC = 2.0;
-
-double threadCpuTime()
-{
-	timespec ts = {};
-	clock_gettime(CLOCK_THREAD_CPUTIME_ID, &ts);
-	return ts.tv_sec + ts.tv_nsec / 1e9;
-}
 
 bool writePicture(const std::string &path, unsigned int seed)
 {

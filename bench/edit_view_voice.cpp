@@ -27,6 +27,7 @@
 #include "View/MemoEditView.h"
 
 #include "BenchEnv.h"
+#include "LoopIterations.h"
 
 using namespace memo_bench;
 
@@ -46,13 +47,6 @@ struct MemoRecorderTestAccess {
 namespace
 {
 const double RECORD_SEC = 10.0;
-
-double threadCpuTime()
-{
-	timespec ts = {};
-	clock_gettime(CLOCK_THREAD_CPUTIME_ID, &ts);
-	return ts.tv_sec + ts.tv_nsec / 1e9;
-}
 
 void settle(double seconds)
 {
@@ -74,8 +68,9 @@ struct Run {
 	MemoRecorder *recorder = nullptr;
 	Evas *evas = nullptr;
 	Result r;
-	double tappedAt = -1, awakeSince = -1, awakeCpuSince = 0;
-	bool wrapped = false, recording = false;
+	double tappedAt = -1;
+	bool wrapped = false;
+	LoopIterations *loop = nullptr; // counts while recording
 
 	// The panel's own status callback, timed on its way.
 	static void statusCb(unsigned long long ms, unsigned long long kb, void *data)
@@ -83,7 +78,7 @@ struct Run {
 		Run *self = static_cast<Run *>(data);
 		if (self->r.firstStatusMs < 0) {
 			self->r.firstStatusMs = (ecore_time_get() - self->tappedAt) * 1000.0;
-			self->recording = true;
+			self->loop->counting = true;
 			ecore_timer_add(RECORD_SEC, endCb, self);
 		}
 		self->r.statusCalls++;
@@ -109,49 +104,37 @@ struct Run {
 		(void)e;
 		(void)eventInfo;
 		Run *self = static_cast<Run *>(data);
-		self->r.frames += self->recording;
+		self->r.frames += self->loop && self->loop->counting;
 	}
 
 	static Eina_Bool endCb(void *data)
 	{
-		static_cast<Run *>(data)->recording = false;
+		static_cast<Run *>(data)->loop->counting = false;
 		ecore_main_loop_quit();
 		return ECORE_CALLBACK_CANCEL;
 	}
 
-	static Eina_Bool wokeCb(void *data)
+	// The handle is made after the tap; its first status comes a tenth of a second after the start.
+	void wrapStatus()
 	{
-		Run *self = static_cast<Run *>(data);
-		self->awakeSince = ecore_time_get();
-		self->awakeCpuSince = threadCpuTime();
-		return ECORE_CALLBACK_RENEW;
-	}
-
-	static Eina_Bool sleepsCb(void *data)
-	{
-		Run *self = static_cast<Run *>(data);
-		recorder_h handle = MemoRecorderTestAccess::handle(self->recorder);
-		// The handle is made after the tap; its first status comes a tenth of a second after the start.
-		if (handle && !self->wrapped) {
-			recorder_set_recording_status_cb(handle, statusCb, self);
-			self->wrapped = true;
+		recorder_h handle = MemoRecorderTestAccess::handle(recorder);
+		if (handle && !wrapped) {
+			recorder_set_recording_status_cb(handle, statusCb, this);
+			wrapped = true;
 		}
-		if (self->recording && self->awakeSince > 0) {
-			self->r.longestMs = std::max(self->r.longestMs, (ecore_time_get() - self->awakeSince) * 1000.0);
-			self->r.longestCpuMs = std::max(self->r.longestCpuMs, (threadCpuTime() - self->awakeCpuSince) * 1000.0);
-		}
-		return ECORE_CALLBACK_RENEW;
 	}
 
 	void go()
 	{
 		evas_event_callback_add(evas, EVAS_CALLBACK_RENDER_POST, renderedCb, this);
-		Ecore_Idle_Exiter *exiter = ecore_idle_exiter_add(wokeCb, this);
-		Ecore_Idle_Enterer *enterer = ecore_idle_enterer_add(sleepsCb, this);
+		LoopIterations iterations;
+		iterations.onIdle = [this] { wrapStatus(); };
+		loop = &iterations;
 		ecore_timer_add(0.1, tapCb, this);
 		ecore_main_loop_begin();
-		ecore_idle_enterer_del(enterer);
-		ecore_idle_exiter_del(exiter);
+		r.longestMs = iterations.longestMs;
+		r.longestCpuMs = iterations.longestCpuMs;
+		loop = nullptr;
 		evas_event_callback_del_full(evas, EVAS_CALLBACK_RENDER_POST, renderedCb, this);
 	}
 };

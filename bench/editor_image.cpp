@@ -28,6 +28,7 @@
 #include "Util/MemoUtil.h"
 
 #include "BenchEnv.h"
+#include "LoopIterations.h"
 #include "BenchPhoto.h"
 
 using namespace memo_bench;
@@ -44,13 +45,6 @@ std::string gRoot;
 
 // Seconds of processor time this thread has used: unlike the wall clock it does not count the time
 // other processes of a busy machine take the processor away.
-double threadCpuTime()
-{
-	timespec ts = {};
-	clock_gettime(CLOCK_THREAD_CPUTIME_ID, &ts);
-	return ts.tv_sec + ts.tv_nsec / 1e9;
-}
-
 enum InsertKind { TYPING, PASTE, GALLERY };
 
 struct BenchPicture {

@@ -18,19 +18,13 @@
 #include <time.h>
 
 #include "BenchEnv.h"
+#include "LoopIterations.h"
 
 using namespace memo_bench;
 
 namespace
 {
 const double RECORD_SEC = 10.0;
-
-double threadCpuTime()
-{
-	timespec ts = {};
-	clock_gettime(CLOCK_THREAD_CPUTIME_ID, &ts);
-	return ts.tv_sec + ts.tv_nsec / 1e9;
-}
 
 struct Result {
 	double prepareMs = 0, startMs = 0, firstStatusMs = -1, commitMs = 0, playerPrepareMs = 0;
@@ -42,26 +36,8 @@ struct Result {
 struct Run {
 	Result r;
 	recorder_h rec = nullptr;
-	double startedAt = -1, awakeSince = -1, awakeCpuSince = 0;
-	bool recording = false;
-
-	static Eina_Bool wokeCb(void *data)
-	{
-		Run *self = static_cast<Run *>(data);
-		self->awakeSince = ecore_time_get();
-		self->awakeCpuSince = threadCpuTime();
-		return ECORE_CALLBACK_RENEW;
-	}
-
-	static Eina_Bool sleepsCb(void *data)
-	{
-		Run *self = static_cast<Run *>(data);
-		if (self->recording && self->awakeSince > 0) {
-			self->r.longestMs = std::max(self->r.longestMs, (ecore_time_get() - self->awakeSince) * 1000.0);
-			self->r.longestCpuMs = std::max(self->r.longestCpuMs, (threadCpuTime() - self->awakeCpuSince) * 1000.0);
-		}
-		return ECORE_CALLBACK_RENEW;
-	}
+	double startedAt = -1;
+	LoopIterations *loop = nullptr; // counts while recording
 
 	static void statusCb(unsigned long long elapsed, unsigned long long, void *data)
 	{
@@ -81,14 +57,14 @@ struct Run {
 			return ECORE_CALLBACK_CANCEL;
 		}
 		self->r.startMs = (ecore_time_get() - self->startedAt) * 1000.0;
-		self->recording = true;
+		self->loop->counting = true;
 		ecore_timer_add(RECORD_SEC, endCb, self);
 		return ECORE_CALLBACK_CANCEL;
 	}
 
 	static Eina_Bool endCb(void *data)
 	{
-		static_cast<Run *>(data)->recording = false;
+		static_cast<Run *>(data)->loop->counting = false;
 		ecore_main_loop_quit();
 		return ECORE_CALLBACK_CANCEL;
 	}
@@ -103,12 +79,15 @@ struct Run {
 		bool ok = recorder_prepare(rec) == RECORDER_ERROR_NONE;
 		r.prepareMs = (ecore_time_get() - t) * 1000.0;
 		if (ok) {
-			Ecore_Idle_Exiter *exiter = ecore_idle_exiter_add(wokeCb, this);
-			Ecore_Idle_Enterer *enterer = ecore_idle_enterer_add(sleepsCb, this);
-			ecore_timer_add(0.1, startCb, this);
-			ecore_main_loop_begin();
-			ecore_idle_enterer_del(enterer);
-			ecore_idle_exiter_del(exiter);
+			{
+				LoopIterations iterations;
+				loop = &iterations;
+				ecore_timer_add(0.1, startCb, this);
+				ecore_main_loop_begin();
+				r.longestMs = iterations.longestMs;
+				r.longestCpuMs = iterations.longestCpuMs;
+				loop = nullptr;
+			}
 			t = ecore_time_get();
 			ok = recorder_commit(rec) == RECORDER_ERROR_NONE;
 			r.commitMs = (ecore_time_get() - t) * 1000.0;
